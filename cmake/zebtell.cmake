@@ -1,0 +1,49 @@
+# What every target of the project has in common.
+
+add_compile_options(-Wall -Wextra -Wpedantic -Werror)
+if(ZEBTELL_SANITIZE)
+    add_compile_options(-fsanitize=${ZEBTELL_SANITIZE} -fno-omit-frame-pointer
+                        -fno-sanitize-recover=all)
+    add_link_options(-fsanitize=${ZEBTELL_SANITIZE})
+endif()
+
+find_package(Threads REQUIRED)
+find_package(PkgConfig REQUIRED)
+
+# The standard headers that nearly every file reads, compiled once.
+add_library(zebtell_std OBJECT ${CMAKE_CURRENT_LIST_DIR}/std.cpp)
+target_precompile_headers(zebtell_std PRIVATE ${CMAKE_CURRENT_LIST_DIR}/std.h)
+
+# zebtell_library(folder DEPENDS layer... LINK target...) makes the layer src/<folder> of all its
+# files, sub-folders included. DEPENDS names the layers that it may include.
+function(zebtell_library name)
+    cmake_parse_arguments(ARG "" "" "DEPENDS;LINK" ${ARGN})
+    file(GLOB_RECURSE sources CONFIGURE_DEPENDS ${PROJECT_SOURCE_DIR}/src/${name}/*.cpp)
+    list(TRANSFORM ARG_DEPENDS PREPEND zebtell_)
+    if(sources)
+        add_library(zebtell_${name} STATIC ${sources})
+        target_include_directories(zebtell_${name} PUBLIC ${PROJECT_SOURCE_DIR}/src)
+        target_link_libraries(zebtell_${name} PUBLIC ${ARG_DEPENDS} ${ARG_LINK} Threads::Threads)
+        target_precompile_headers(zebtell_${name} REUSE_FROM zebtell_std)
+    else()
+        add_library(zebtell_${name} INTERFACE)
+        target_include_directories(zebtell_${name} INTERFACE ${PROJECT_SOURCE_DIR}/src)
+        target_link_libraries(zebtell_${name} INTERFACE ${ARG_DEPENDS} ${ARG_LINK} Threads::Threads)
+    endif()
+endfunction()
+
+# zebtell_test(folder LINK layer...) makes one test program of tests/<folder>/*.cpp.
+function(zebtell_test name)
+    cmake_parse_arguments(ARG "" "" "LINK" ${ARGN})
+    file(GLOB sources CONFIGURE_DEPENDS ${PROJECT_SOURCE_DIR}/tests/${name}/*.cpp)
+    if(NOT sources)
+        return()
+    endif()
+    list(TRANSFORM ARG_LINK PREPEND zebtell_)
+    add_executable(${name}_tests ${sources})
+    target_include_directories(${name}_tests PRIVATE ${PROJECT_SOURCE_DIR})
+    target_link_libraries(${name}_tests PRIVATE ${ARG_LINK} zebtell_test_main)
+    target_compile_definitions(${name}_tests PRIVATE ZEBTELL_SOURCE_DIR="${PROJECT_SOURCE_DIR}")
+    target_precompile_headers(${name}_tests REUSE_FROM zebtell_test_main)
+    add_test(NAME ${name} COMMAND ${name}_tests)
+endfunction()

@@ -1,0 +1,16 @@
+#pragma once
+
+#include "base/clock.h"
+#include "data/data_application.h"
+#include "host/settings.h"
+
+namespace zebtell::host {
+
+// What all sessions share. Owned by the program, outlives every session.
+struct Services {
+    SettingsStore& settings;
+    data::DataApplicationFactory make_application;
+    base::Clock clock;
+};
+
+}  // namespace zebtell::host

@@ -1,0 +1,49 @@
+#pragma once
+
+#include <exception>
+#include <string_view>
+#include <vector>
+
+#include "markup/tag.h"
+#include "web/call.h"
+
+namespace zebtell::web {
+
+// Whether a handler can hold its thread up (a commit, a password hash, a database on the network)
+// and so may not run on an IO thread.
+enum class Work { kQuick, kMayWait };
+
+template <class State>
+struct PageEvent {
+    std::string_view name;
+    void (*handle)(State&, Call&);
+    Work work = Work::kQuick;
+};
+
+// One page: its name, its template and its handlers. State is what a session holds.
+template <class State>
+struct Page {
+    std::string_view name;
+    std::string_view template_file;
+    void (*Respond)(State&, Call&) = nullptr;
+    // Null: every tag leaves its contents.
+    void (*ProcessTag)(State&, Call&, markup::Tag&) = nullptr;
+    // For event names made at run time. Null: such events show the page's template.
+    void (*UserEvent)(State&, Call&, std::string_view event) = nullptr;
+    std::vector<PageEvent<State>> events = {};
+};
+
+// What the runtime raises on the application around the pages.
+template <class State>
+struct WebClass {
+    void (*BeginRequest)(State&, Call&);
+    void (*Start)(State&, Call&);  // a request that names no page
+    void (*EndRequest)(State&, Call&);
+    // An error that no handler caught; the runtime sends its own answer unless SendDefault is
+    // made false.
+    void (*FatalErrorResponse)(State&, Call&, const std::exception& error, bool& SendDefault);
+    void (*Terminate)(State&);
+    bool (*IsLoggedOn)(const State&);
+};
+
+}  // namespace zebtell::web
