@@ -1,0 +1,154 @@
+#include "host/logon.h"
+
+#include "base/rounding.h"
+#include "base/text.h"
+#include "host/blocking.h"
+#include "host/errors.h"
+#include "host/texts.h"
+
+namespace zebtell::host {
+namespace {
+
+using base::EqualNoCase;
+using data::DataApplication;
+using data::Record;
+
+constexpr LocalText kInvalid = {"Vale kasutajanimi või parool!",
+                                "Invalid user name or password!",
+                                "Nederīgs lietotājvārds vai parole!"};
+
+struct Credentials {
+    std::string user;
+    std::string password;
+};
+
+// What the form says; nobody's name, or the guest's, logs the guest on.
+Credentials ReadCredentials(SessionState& state,
+                            const web::Request& request,
+                            const Settings& settings) {
+    Credentials typed{request.Form["ZEB_IN_KASUTAJATUNNUS"], request.Form["ZEB_IN_PAROOL"]};
+    state.logon.IsGuest = typed.user.empty() || EqualNoCase(typed.user, settings.DispName);
+    if (state.logon.IsGuest) typed = {settings.UserID, settings.PassWord};
+    return typed;
+}
+
+std::int64_t LinkID(Record& record, std::string_view field) {
+    const base::Value value = record.GetField(field);
+    return value.IsBlank() ? 0 : value.ToInteger64();
+}
+
+std::shared_ptr<Record> LoadLinked(DataApplication& application,
+                                   std::string_view table,
+                                   std::int64_t id) {
+    return id == 0 ? nullptr : application.Load(table, id);
+}
+
+double PriceFactor(Record& user) {
+    const base::Value cut = user.GetField("Partner.PriceCut");
+    return cut.IsBlank() ? 1 : (100 + cut.ToDouble()) / 100;
+}
+
+// The partner's list, else the settlement company's, else the one that orders use.
+std::int64_t PriceList(DataApplication& application, Record& user, Record* settlement) {
+    if (const auto own = LinkID(user, "Partner.IDGRPriceList")) return own;
+    if (settlement != nullptr) {
+        if (const auto theirs = LinkID(*settlement, "IDGRPriceList")) return theirs;
+    }
+    return application.DefaultLink("SDOrder", "GRPriceList");
+}
+
+CompanyState LoadCompany(DataApplication& application, std::shared_ptr<Record> user) {
+    CompanyState company;
+    company.PartnerRecord = user;
+    const std::int64_t partner = LinkID(*user, "IDPartner");
+    company.CompanyRecord = LoadLinked(application, "GRCompany", partner);
+    company.CompanyLoaded = company.CompanyRecord != nullptr;
+    if (company.CompanyLoaded) {
+        company.CustomerKey = base::ToInteger32(static_cast<double>(partner));
+        company.ParentRecord =
+            LoadLinked(application, "GRCompany", LinkID(*company.CompanyRecord, "IDParent"));
+        company.ParentLoaded = company.ParentRecord != nullptr;
+    }
+    company.PriceFactor = PriceFactor(*user);
+    company.SettlementRecord =
+        LoadLinked(application, "GRCompany", LinkID(*user, "Partner.IDSettlCompany"));
+    company.PriceListId = base::ToInteger32(
+        static_cast<double>(PriceList(application, *user, company.SettlementRecord.get())));
+    company.IDContactPerson = LinkID(*user, "IDGRCompContPerson");
+    company.ContactRecord = LoadLinked(application, "GRCompContPerson", company.IDContactPerson);
+    company.ContactLoaded = company.ContactRecord != nullptr;
+    return company;
+}
+
+void LogOn(SessionState& state, const Settings& settings, const Credentials& credentials) {
+    auto application = state.services.make_application();
+    // The guest's name here is this word, whatever the settings call him.
+    application->Initialise("ZEBTell", "WEBUser", "WEBGuest", "Külaline");
+    auto user =
+        application->Logon(settings.Type, settings.Path, credentials.user, credentials.password);
+    state.company = LoadCompany(*application, std::move(user));
+    state.logon.Application = std::move(application);
+    state.logon.LoggedOn = true;
+    state.logon.UserName = credentials.user;
+    state.logon.Password = credentials.password;
+}
+
+void GoOn(SessionState& state, web::Call& call) {
+    const std::string page = std::exchange(state.logon.ReturnPage, {});
+    call.RedirectTo(page.empty() ? "Raamistik" : std::string_view(page));
+}
+
+std::string LoggedInEntry(const web::Request& request, std::string_view user) {
+    return base::WithoutControls(user) + " logged in (" + request.ServerVariables("REMOTE_HOST") +
+           ";" + request.ServerVariables("REMOTE_ADDR") + ")";
+}
+
+}  // namespace
+
+void Logon_Respond(SessionState& state, web::Call& call) {
+    SetNoCache(call);
+    OrErrorPage(state, call, [&] { call.WriteTemplate(); });
+}
+
+void Logon_Logon(SessionState& state, web::Call& call) {
+    const auto settings = state.settings();
+    if (IsBlocked(state, *settings)) {
+        state.Message = BlockedMessage(*settings);
+        call.RedirectTo("Logon");
+        return;
+    }
+    const Credentials credentials = ReadCredentials(state, call.request, *settings);
+    if (state.logon.LoggedOn) {
+        if (EqualNoCase(credentials.user, state.logon.UserName) &&
+            EqualNoCase(credentials.password, state.logon.Password)) {
+            GoOn(state, call);
+            return;
+        }
+        ResetUserState(state);
+    }
+    const auto refuse = [&] {
+        CountFailure(state, *settings, credentials.user);
+        state.Message = kInvalid.In(settings->language());
+        call.RedirectTo("Logon");
+    };
+    const auto enter = [&] {
+        LogOn(state, *settings, credentials);
+        call.RenewToken();
+        WriteLog(state, LoggedInEntry(call.request, credentials.user), log_Normal);
+        GoOn(state, call);
+    };
+    Guarded(state, "Logon_Logon", enter, refuse);
+}
+
+void Logout_Respond(SessionState& state, web::Call& call) {
+    WriteLog(state, base::WithoutControls(state.logon.UserName) + " logged out", log_Normal);
+    ResetUserState(state);
+    OrErrorPage(state, call, [&] { call.WriteTemplate(); });
+    call.ReleaseInstance();
+}
+
+void Logout_Hyperlink2(SessionState&, web::Call& call) {
+    call.NextItem("Logon");
+}
+
+}  // namespace zebtell::host
