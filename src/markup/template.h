@@ -10,6 +10,7 @@
 namespace zebtell::markup {
 
 struct Node;
+struct NodeTree;
 
 // A template text, parsed once and shared by all threads that expand it.
 //
@@ -26,14 +27,16 @@ class Template {
 
     const std::string& name() const { return name_; }
     const std::string& text() const { return text_; }
-    const Node& root() const { return *root_; }
+    // The whole text as a node without a name; see node.h for how to walk below it.
+    const Node& root() const;
+    const NodeTree& tree() const { return *tree_; }
 
   private:
     Template(std::string name, std::string text);
 
     std::string name_;
     std::string text_;
-    std::unique_ptr<const Node> root_;
+    std::unique_ptr<const NodeTree> tree_;
 };
 
 // Where a page must end rather than go on: a template that repeats itself without end.
