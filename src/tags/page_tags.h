@@ -16,12 +16,14 @@ const TagTable& OrderSummaryTagTable();
 bool QueryFieldTag(TagCall& call);
 
 // A page's ProcessTag: the common tags, the order summary tags, the page's own table, then the
-// page's queries. Errors are logged as "<handler> error:" and end the tag's handling.
+// page's queries. Errors are logged as "<handler> error:" and end the tag's handling. `row_key`
+// stands for the customer's key in the page's queries; 0: the customer's key itself.
 void ProcessPageTag(host::SessionState& state,
                     web::Call& call,
                     markup::Tag& tag,
                     std::string_view handler,
                     std::string_view page,
-                    const TagTable* own);
+                    const TagTable* own,
+                    std::int32_t row_key = 0);
 
 }  // namespace zebtell::tags

@@ -1,10 +1,12 @@
 #pragma once
 
 #include <cstdint>
+#include <functional>
 #include <initializer_list>
 #include <string>
 #include <string_view>
 #include <unordered_map>
+#include <utility>
 #include <vector>
 
 #include "host/session_state.h"
@@ -46,8 +48,16 @@ class TagTable {
     const std::vector<TagRow>& rows() const { return rows_; }
 
   private:
+    // Hashes the bytes: names that are asked for are in lower case already.
+    struct NameHash {
+        using is_transparent = void;
+        std::size_t operator()(std::string_view name) const {
+            return std::hash<std::string_view>()(name);
+        }
+    };
+
     std::vector<TagRow> rows_;
-    std::unordered_map<std::string, std::size_t, base::NoCaseHash, base::NoCaseEqual> exact_;
+    std::unordered_map<std::string, std::size_t, NameHash, std::equal_to<>> exact_;
     std::vector<std::pair<std::string, std::size_t>> patterns_;  // in lower case
 };
 

@@ -1,0 +1,22 @@
+#pragma once
+
+#include <span>
+#include <string>
+#include <string_view>
+
+#include "tags/custom_func.h"
+#include "tags/tag_table.h"
+
+namespace zebtell::tags {
+
+// What the tag's contents name, cleaned.
+inline std::string Reference(const TagCall& call) { return CleanFormValue(call.tag.TagContents()); }
+
+// Writes the field of `record` that the contents name, formatted; fields of `fixed` with two
+// decimals. "&nbsp;" when there is no record.
+void WriteField(TagCall& call, data::Record* record, std::span<const std::string_view> fixed = {});
+
+// A field as plain text, escaped: for text boxes, where "&nbsp;" would be typed text.
+void WritePlainField(TagCall& call, data::Record& record, std::string_view field);
+
+}  // namespace zebtell::tags

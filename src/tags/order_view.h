@@ -1,0 +1,14 @@
+#pragma once
+
+#include "tags/tag_table.h"
+
+namespace zebtell::tags {
+
+// The tags that show the stored order of the session: header, rows, tax lines. The order view page
+// and the page after a confirmation share them.
+const TagTable& OrderViewTagTable();
+
+// The row and tax blocks begin with their first lines again.
+void RewindOrderView(host::SessionState& state);
+
+}  // namespace zebtell::tags
