@@ -25,6 +25,8 @@ class DateTime {
     constexpr explicit DateTime(double days) : days_(days) {}
     // RuntimeError 5 when the fields are no date.
     static DateTime FromCalendar(const CalendarTime& fields);
+    // Nothing when the fields are no date.
+    static std::optional<DateTime> FromFields(const CalendarTime& fields);
     static DateTime Now();    // the server's local time, to the second
     static DateTime Today();  // with time 00:00:00
     // "2026-11-21", "2026-11-21 14:05:09", "2026-11-21T14:05:09"; nothing for anything else.

@@ -16,7 +16,8 @@ struct Region {
     char date_mark = '/';
     char time_mark = ':';
     DateOrder date_order = DateOrder::kDayMonthYear;
-    std::string currency_picture;  // the named format "Currency" as a number picture
+    std::string currency_picture;   // the named format "Currency" as a number picture
+    std::string long_date_picture;  // the named format "Long Date" as a date picture
     std::array<std::string, 12> months;
     std::array<std::string, 12> short_months;
     std::array<std::string, 7> days;  // from Sunday

@@ -7,10 +7,12 @@
 
 namespace zebtell::base {
 
-// Text is UTF-8 throughout. "Ignoring case" folds Unicode letters one to one.
+// Text is UTF-8 throughout. "Ignoring case" folds Latin, Greek and Cyrillic letters one to one,
+// never to a letter of another length in bytes.
 
 std::string_view Trimmed(std::string_view text);  // blanks only, at both ends
 std::string Lower(std::string_view text);
+std::string Upper(std::string_view text);
 std::string LowerAscii(std::string_view text);
 bool EqualNoCase(std::string_view a, std::string_view b);
 bool StartsWithNoCase(std::string_view text, std::string_view start);

@@ -1,0 +1,24 @@
+#pragma once
+
+#include <cstddef>
+#include <string>
+#include <string_view>
+
+namespace zebtell::base {
+
+// One code point of UTF-8 text and the bytes it takes.
+struct CodePoint {
+    char32_t value = 0;
+    std::size_t size = 1;
+};
+
+// The code point that begins at `at` (which must lie in the text). A byte that begins none counts
+// for itself, with a value that no character has.
+CodePoint DecodeAt(std::string_view text, std::size_t at);
+
+// Case of one letter. Only pairs that take equally many bytes in UTF-8 are known (Latin, Greek and
+// Cyrillic letters), so that changing case never moves a position in a text.
+char32_t LowerLetter(char32_t letter);
+char32_t UpperLetter(char32_t letter);
+
+}  // namespace zebtell::base
