@@ -1,0 +1,35 @@
+#pragma once
+
+#include <ctime>
+#include <optional>
+#include <string>
+#include <string_view>
+
+#include "http/message.h"
+
+namespace zebtell::http {
+
+// How the connection goes on behind a response, for its Connection header.
+enum class After { kKeepAlive, kKeepAliveHttp10, kClose };
+
+// Appends the status line and all headers of a response, the empty line included. `date` is the
+// value of the Date header.
+void AppendHead(std::string& out, const Response& response, std::string_view date, After after);
+
+// Whether a response of that status has a body at all.
+bool HasBody(int status);
+
+// What is answered to a request that no handler gets to see, or that its handler left unanswered.
+Response ErrorResponse(int status);
+
+// The Date header's value, made anew once a second. For one thread.
+class DateHeader {
+  public:
+    std::string_view Now();
+
+  private:
+    std::optional<std::time_t> second_;
+    std::string text_;
+};
+
+}  // namespace zebtell::http
