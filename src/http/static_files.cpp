@@ -1,0 +1,171 @@
+#include "http/static_files.h"
+
+#include <algorithm>
+#include <array>
+#include <cstdio>
+#include <fstream>
+#include <utility>
+
+#include "base/text.h"
+#include "http/http_date.h"
+#include "http/response_head.h"
+#include "http/url.h"
+
+namespace zebtell::http {
+namespace {
+
+namespace fs = std::filesystem;
+
+constexpr std::uintmax_t kMaxBytes = 4 * 1024 * 1024;
+constexpr std::chrono::seconds kCheckInterval(1);
+
+constexpr std::pair<std::string_view, std::string_view> kContentTypes[] = {
+    {".css", "text/css; charset=utf-8"},
+    {".js", "text/javascript; charset=utf-8"},
+    {".txt", "text/plain; charset=utf-8"},
+    {".svg", "image/svg+xml"},
+    {".png", "image/png"},
+    {".jpg", "image/jpeg"},
+    {".jpeg", "image/jpeg"},
+    {".gif", "image/gif"},
+    {".webp", "image/webp"},
+    {".ico", "image/x-icon"},
+    {".woff", "font/woff"},
+    {".woff2", "font/woff2"},
+};
+
+std::string_view ContentType(std::string_view name) {
+    for (const auto& [ending, type] : kContentTypes) {
+        if (base::EndsWithNoCase(name, ending)) return type;
+    }
+    return {};
+}
+
+// Names that can't lead out of the folder or to a hidden file, whatever the file system makes of
+// them; where symbolic links lead is looked at later.
+bool IsPlainName(std::string_view name) {
+    if (name.find_first_of(std::string_view("\\:\0", 3)) != std::string_view::npos) return false;
+    while (true) {
+        const std::size_t slash = name.find('/');
+        const std::string_view segment = name.substr(0, slash);
+        if (segment.empty() || segment.front() == '.') return false;
+        if (slash == std::string_view::npos) return true;
+        name.remove_prefix(slash + 1);
+    }
+}
+
+bool IsInside(const fs::path& folder, const fs::path& file) {
+    const auto [in_folder, in_file] =
+        std::mismatch(folder.begin(), folder.end(), file.begin(), file.end());
+    return in_folder == folder.end() && in_file != file.end();
+}
+
+// FNV-1a: the same bytes have the same tag on every server and after every deployment.
+std::string ETag(std::string_view bytes) {
+    std::uint64_t hash = 0xcbf29ce484222325U;
+    for (const char c : bytes) hash = (hash ^ static_cast<unsigned char>(c)) * 0x100000001b3U;
+    std::array<char, 48> text{};
+    const int size = std::snprintf(text.data(),
+                                   text.size(),
+                                   "\"%llx-%zx\"",
+                                   static_cast<unsigned long long>(hash),
+                                   bytes.size());
+    return {text.data(), static_cast<std::size_t>(size)};
+}
+
+std::optional<std::string> ReadFile(const fs::path& path) {
+    std::ifstream in(path, std::ios::binary);
+    std::string bytes(std::istreambuf_iterator<char>(in), {});
+    if (!in || bytes.size() > kMaxBytes) return {};
+    return bytes;
+}
+
+bool HasTag(std::string_view list, std::string_view etag) {
+    for (std::string_view tag : base::Split(list, ',')) {
+        tag = base::Trimmed(tag);
+        if (tag.starts_with("W/")) tag.remove_prefix(2);
+        if (tag == etag || tag == "*") return true;
+    }
+    return false;
+}
+
+}  // namespace
+
+StaticFiles::StaticFiles(fs::path folder, std::string prefix)
+    : folder_(std::move(folder)), prefix_(std::move(prefix)) {}
+
+std::optional<Response> StaticFiles::Serve(const Request& request) {
+    const std::string_view path = request.Path();
+    if (!path.starts_with(prefix_)) return {};
+    if (request.method != "GET" && request.method != "HEAD") return ErrorResponse(405);
+    const std::string name = DecodePath(path.substr(prefix_.size()));
+    const bool may_be_asked_for = IsPlainName(name) && !ContentType(name).empty();
+    const FilePointer file = may_be_asked_for ? Find(name) : nullptr;
+    return file ? Answer(request, file) : ErrorResponse(404);
+}
+
+StaticFiles::FilePointer StaticFiles::Find(const std::string& name) {
+    const auto now = Clock::now();
+    FilePointer known;
+    {
+        const std::lock_guard lock(mutex_);
+        const auto found = files_.find(name);
+        if (found != files_.end()) {
+            if (now - found->second.checked < kCheckInterval) return found->second.file;
+            found->second.checked = now;  // the others go on with what is known meanwhile
+            known = found->second.file;
+        }
+    }
+    FilePointer file = Load(name, known);
+    const std::lock_guard lock(mutex_);
+    if (file) {
+        files_[name] = {file, now};
+    } else {
+        files_.erase(name);  // not kept: there is no end of names that are not there
+    }
+    return file;
+}
+
+StaticFiles::FilePointer StaticFiles::Load(const std::string& name,
+                                           const FilePointer& known) const {
+    std::error_code error;
+    const fs::path folder = fs::canonical(folder_, error);
+    if (error) return nullptr;
+    const fs::path path = fs::canonical(folder / name, error);
+    if (error || !IsInside(folder, path) || ContentType(path.native()).empty()) return nullptr;
+    if (!fs::is_regular_file(path, error) || fs::file_size(path, error) > kMaxBytes) return nullptr;
+    const auto stamp = fs::last_write_time(path, error);
+    if (error) return nullptr;
+    if (known && known->stamp == stamp) return known;
+    auto bytes = ReadFile(path);
+    if (!bytes) return nullptr;
+    auto file = std::make_shared<File>();
+    file->bytes = std::move(*bytes);
+    file->content_type = ContentType(name);
+    file->etag = ETag(file->bytes);
+    file->modified = std::chrono::system_clock::to_time_t(
+        std::chrono::file_clock::to_sys(std::chrono::time_point_cast<std::chrono::seconds>(stamp)));
+    file->stamp = stamp;
+    return file;
+}
+
+Response StaticFiles::Answer(const Request& request, const FilePointer& file) {
+    Response response;
+    response.headers = {{"Cache-Control", "public, max-age=3600"},
+                        {"ETag", file->etag},
+                        {"Last-Modified", FormatHttpDate(file->modified)}};
+    const std::string_view tags = request.HeaderValue("If-None-Match");
+    const auto since = ParseHttpDate(request.HeaderValue("If-Modified-Since"));
+    const bool is_known =
+        tags.empty() ? since && file->modified <= *since : HasTag(tags, file->etag);
+    if (is_known) {
+        response.status = 304;
+        return response;
+    }
+    response.headers.emplace_back("Content-Type", file->content_type);
+    response.headers.emplace_back("X-Content-Type-Options", "nosniff");
+    response.shared_body = std::shared_ptr<const std::string>(file, &file->bytes);
+    return response;
+}
+
+}  // namespace zebtell::http
