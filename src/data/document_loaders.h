@@ -18,6 +18,9 @@ struct ShownDocument {
     std::shared_ptr<RecordList> Taxes;
     std::int16_t TaxCount = 0;
     std::int16_t RowCursor = 1;
+    std::shared_ptr<Record> CurrentRow;  // the row and the tax line being shown
+    std::int16_t TaxCursor = 1;
+    std::shared_ptr<Record> CurrentTax;
 };
 
 // Each loads the document that `filter` names: any three characters ("ID=", "ID_"), then its ID.

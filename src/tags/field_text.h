@@ -10,7 +10,9 @@
 namespace zebtell::tags {
 
 // What the tag's contents name, cleaned.
-inline std::string Reference(const TagCall& call) { return CleanFormValue(call.tag.TagContents()); }
+inline std::string Reference(const TagCall& call) {
+    return CleanFormValue(call.tag.TagContents());
+}
 
 // Writes the field of `record` that the contents name, formatted; fields of `fixed` with two
 // decimals. "&nbsp;" when there is no record.

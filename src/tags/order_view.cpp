@@ -12,11 +12,17 @@ constexpr std::string_view kHeaderSums[] = {"Amount", "TaxAmount", "AmountWTax"}
 constexpr std::string_view kRowNumbers[] = {"Amount", "Quantity", "UnitPrice", "Price"};
 constexpr std::string_view kTaxSums[] = {"Base", "Amount"};
 
-ShownDocument& Shown(TagCall& c) { return c.state.documents.ShownOrder; }
+ShownDocument& Shown(TagCall& c) {
+    return c.state.documents.ShownOrder;
+}
 
 // One line of a block: reads the record under the cursor and comes again while there are more.
-bool Line(TagCall& c, std::string_view tag, data::RecordList* list, std::int16_t count,
-          std::int16_t& cursor, std::shared_ptr<data::Record>& current) {
+bool Line(TagCall& c,
+          std::string_view tag,
+          data::RecordList* list,
+          std::int16_t count,
+          std::int16_t& cursor,
+          std::shared_ptr<data::Record>& current) {
     if (list == nullptr || cursor > count) {
         c.tag.Hide();
         return true;
@@ -29,14 +35,14 @@ bool Line(TagCall& c, std::string_view tag, data::RecordList* list, std::int16_t
 
 bool TellRida(TagCall& c) {
     ShownDocument& order = Shown(c);
-    return Line(c, "ZEB:TellRida", order.Rows.get(), order.RowCount, order.RowCursor,
-                order.CurrentRow);
+    return Line(
+        c, "ZEB:TellRida", order.Rows.get(), order.RowCount, order.RowCursor, order.CurrentRow);
 }
 
 bool MaksuRida(TagCall& c) {
     ShownDocument& order = Shown(c);
-    return Line(c, "ZEB:MaksuRida", order.Taxes.get(), order.TaxCount, order.TaxCursor,
-                order.CurrentTax);
+    return Line(
+        c, "ZEB:MaksuRida", order.Taxes.get(), order.TaxCount, order.TaxCursor, order.CurrentTax);
 }
 
 bool Header(TagCall& c) {
@@ -105,6 +111,12 @@ const TagTable& OrderViewTagTable() {
         {"ZEB:SDOrderLink", OrderLink, "address of the order's own page"},
     };
     return kTable;
+}
+
+void ReadShownOrder(host::SessionState& state) {
+    const std::string& filter = state.confirmation.ShownOrderFilter;
+    if (state.documents.ShownOrder.Header || filter.empty()) return;
+    data::LoadShownOrder(state.application(), filter, state.documents.ShownOrder);
 }
 
 void RewindOrderView(host::SessionState& state) {

@@ -3,6 +3,7 @@
 #include <cstdint>
 #include <memory>
 #include <string>
+#include <unordered_map>
 
 #include "data/record_list.h"
 
@@ -37,9 +38,8 @@ struct CatalogueState {
     std::string SearchCodeColumn;
     std::string SearchNameColumn;
 
-    std::string CategoryOptions;       // the category entries, built once
-    std::string CategoryOptionsGroup;  // the group that they were built for
-    bool HasCategoryOptions = false;
+    // The category entries of each group's option list, by group and condition; built once.
+    std::unordered_map<std::string, std::string> CategoryOptions;
 };
 
 }  // namespace zebtell::host

@@ -1,0 +1,165 @@
+#include "catalogue/kaubainfo.h"
+
+#include "base/text.h"
+#include "catalogue/criteria.h"
+#include "catalogue/kaubainfo_tags.h"
+#include "catalogue/price_list.h"
+#include "host/errors.h"
+#include "tags/custom_func.h"
+#include "tags/form_values.h"
+#include "tags/page_tags.h"
+
+namespace zebtell::catalogue {
+namespace {
+
+using host::CatalogueState;
+using host::SessionState;
+
+constexpr std::int32_t kFavouritesCategory = -1;
+constexpr std::string_view kReadingFailed = "Probleem andmete lugemisel, proovige uuesti!";
+
+void ShowPage(SessionState& state, web::Call& call) {
+    host::SetNoCache(call);
+    host::OrErrorPage(state, call, [&] { call.WriteTemplate(); });
+}
+
+// The three events that fill the list: an error leaves the list that was there, with a message.
+template <class Build>
+void BuildAndShow(SessionState& state, web::Call& call, std::string_view handler, Build&& build) {
+    if (!host::CheckLogon(state, call)) return;
+    host::Guarded(state, handler, build, [&] {
+        state.Message = kReadingFailed;
+        RewindPage(state.catalogue);
+    });
+    ShowPage(state, call);
+}
+
+std::string Posted(const web::Call& call, std::string_view field) {
+    return tags::CleanFormValue(call.request.Form[field]);
+}
+
+void ReadSearch(CatalogueState& catalogue, const web::Call& call) {
+    catalogue.LastFind = Posted(call, "ZEBInText");
+    if (catalogue.SearchNameColumn.empty()) catalogue.SearchNameColumn = "name";
+    if (catalogue.SearchCodeColumn.empty()) catalogue.SearchCodeColumn = "code";
+}
+
+ListRequest RequestFor(const SessionState& state, std::string category) {
+    const CatalogueState& catalogue = state.catalogue;
+    return {.PriceListId = state.company.PriceListId,
+            .category = std::move(category),
+            .find = catalogue.LastFind,
+            .SearchCodeColumn = catalogue.SearchCodeColumn,
+            .SearchNameColumn = catalogue.SearchNameColumn,
+            .FilterText = catalogue.FilterText};
+}
+
+// The sort choice counts unless the search button was pressed.
+void ReadOrder(CatalogueState& catalogue, const web::Call& call) {
+    if (!Posted(call, "Find_GRArticle").empty() || !call.request.Form.Has("DataOrder")) return;
+    catalogue.OrderText = Posted(call, "DataOrder");
+    catalogue.ListFresh = false;
+}
+
+std::int32_t CategoryNumber(const std::string& text) {
+    const auto number = base::ParseNumber(text);
+    const bool fits = number && *number >= INT32_MIN && *number <= INT32_MAX;
+    return fits ? static_cast<std::int32_t>(*number) : 0;
+}
+
+void OpenFavourites(SessionState& state) {
+    state.catalogue.CategoryId = kFavouritesCategory;
+    const std::int32_t price_list = state.company.PriceListId;
+    std::string favourites = state.catalogue.FavoritesText;
+    if (price_list != 0 && !favourites.empty()) {
+        const auto partner = state.company.PartnerRecord->GetField("Partner.ID");
+        favourites = base::Replaced(favourites, "#", partner.ToPlainText());
+    }
+    OpenList(state, FavouritesCriterion(price_list, favourites));
+}
+
+void OpenCategory(SessionState& state, const web::Call& call) {
+    CatalogueState& catalogue = state.catalogue;
+    ReadOrder(catalogue, call);
+    std::string category = Posted(call, "Combo_GRArticleCat");
+    ReadSearch(catalogue, call);
+    catalogue.CategoryId = CategoryNumber(category);
+    if (catalogue.CategoryId == kFavouritesCategory) {
+        // The favourites entry of the category choice; a search goes over everything.
+        if (catalogue.LastFind.empty()) return OpenFavourites(state);
+        catalogue.CategoryId = 0;
+        category.clear();
+    }
+    if (category == "0") category.clear();
+    OpenList(state, CategoryCriterion(RequestFor(state, std::move(category))));
+}
+
+void ChooseRow(SessionState& state, web::Call& call, std::string_view id) {
+    CatalogueState& catalogue = state.catalogue;
+    if (catalogue.ListQuery) {
+        state.basket_form.RowToAdd = catalogue.ListQuery->Find("ID=" + std::string(id));
+    }
+    call.NextItem("Lisamine");
+}
+
+}  // namespace
+
+void Kaubainfo_Respond(SessionState& state, web::Call& call) {
+    if (!host::CheckLogon(state, call)) return;
+    CatalogueState& catalogue = state.catalogue;
+    if (!catalogue.ListFresh) catalogue.PageNumber = 1;
+    catalogue.ListFresh = false;
+    RewindPage(catalogue);
+    ShowPage(state, call);
+    // The catalogue opens with the favourites, once the template has said which they are.
+    if (!catalogue.FavoritesText.empty() && !catalogue.ListQuery) {
+        call.response.Clear();
+        call.RedirectTo("Kaubainfo", "Favorites");
+    }
+}
+
+void Kaubainfo_ProcessTag(SessionState& state, web::Call& call, markup::Tag& tag) {
+    tags::ProcessPageTag(
+        state, call, tag, "Kaubainfo_ProcessTag", "Kaubainfo", &KaubainfoTagTable());
+}
+
+void Kaubainfo_UserEvent(SessionState& state, web::Call& call, std::string_view event) {
+    if (!host::CheckLogon(state, call)) return;
+    const auto work = [&] {
+        if (base::StartsWithNoCase(event, "ID_")) return ChooseRow(state, call, event.substr(3));
+        if (base::EndsWithNoCase(event, "Page")) TurnPage(state.catalogue, event);
+        RewindPage(state.catalogue);
+    };
+    host::Guarded(state, "Kaubainfo_UserEvent", work);
+    if (!base::StartsWithNoCase(event, "ID_")) ShowPage(state, call);
+}
+
+void Kaubainfo_Favorites(SessionState& state, web::Call& call) {
+    BuildAndShow(state, call, "Kaubainfo_Favorites", [&] { OpenFavourites(state); });
+}
+
+void Kaubainfo_Hinnakiri(SessionState& state, web::Call& call) {
+    BuildAndShow(state, call, "Kaubainfo_Hinnakiri", [&] {
+        tags::SaveFormValues(state, call.request);
+        OpenCategory(state, call);
+    });
+}
+
+void Kaubainfo_Otsing(SessionState& state, web::Call& call) {
+    BuildAndShow(state, call, "Kaubainfo_Otsing", [&] {
+        tags::SaveFormValues(state, call.request);
+        ReadSearch(state.catalogue, call);
+        OpenList(state, SearchCriterion(RequestFor(state, {})));
+    });
+}
+
+void Kaubainfo_Navigate(SessionState& state, web::Call& call) {
+    if (!host::CheckLogon(state, call)) return;
+    host::Guarded(state, "Kaubainfo_Navigate", [&] {
+        TurnPage(state.catalogue, tags::CleanFormValue(call.request.Value("Nav")));
+        RewindPage(state.catalogue);
+    });
+    ShowPage(state, call);
+}
+
+}  // namespace zebtell::catalogue

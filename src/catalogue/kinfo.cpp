@@ -1,0 +1,71 @@
+#include "catalogue/kinfo.h"
+
+#include "base/text.h"
+#include "host/errors.h"
+#include "tags/custom_func.h"
+#include "tags/page_tags.h"
+
+namespace zebtell::catalogue {
+namespace {
+
+using host::SessionState;
+
+void ShowPage(SessionState& state, web::Call& call) {
+    host::SetNoCache(call);
+    host::OrErrorPage(state, call, [&] { call.WriteTemplate(); });
+}
+
+std::shared_ptr<data::Record> ReadArticle(SessionState& state, const std::string& id) {
+    if (!base::ParseNumber(id)) return nullptr;
+    const auto list = state.application().OpenList("GRArticle", "ID=" + id, "");
+    return list->Count() == 0 ? nullptr : list->Item(1);
+}
+
+bool Article(tags::TagCall& c) {
+    data::Record* article = c.state.documents.Article.get();
+    const auto settings = c.state.settings();
+    c.tag.Write(
+        article == nullptr
+            ? "&nbsp;"
+            : tags::FormatFieldValue(
+                  *article, tags::CleanFormValue(c.tag.TagContents()), "", settings->region()));
+    return true;
+}
+
+bool Mode(tags::TagCall& c) {
+    const bool here = c.tag.LowerName() == "zeb:mode.kinfo";
+    here ? c.tag.Show() : c.tag.Hide();
+    return true;
+}
+
+}  // namespace
+
+void KInfo_Respond(SessionState& state, web::Call& call) {
+    if (!host::CheckLogon(state, call)) return;
+    state.Message.clear();
+    ShowPage(state, call);
+}
+
+void KInfo_ProcessTag(SessionState& state, web::Call& call, markup::Tag& tag) {
+    tags::ProcessPageTag(state, call, tag, "KInfo_ProcessTag", "KInfo", &KInfoTagTable());
+}
+
+void KInfo_UserEvent(SessionState& state, web::Call& call, std::string_view) {
+    if (!host::CheckLogon(state, call)) return;
+    const auto read = [&] {
+        const std::string id = tags::CleanFormValue(call.request.Value("ID"));
+        state.documents.Article = ReadArticle(state, id);
+    };
+    host::Guarded(state, "KInfo_UserEvent", read, [&] { state.documents.Article.reset(); });
+    ShowPage(state, call);
+}
+
+const tags::TagTable& KInfoTagTable() {
+    static const tags::TagTable kTable{
+        {"ZEB:GRArticle", Article, "a field of the article"},
+        {"ZEB:Mode.*", Mode, "contents when the name behind the dot is this page's, KInfo"},
+    };
+    return kTable;
+}
+
+}  // namespace zebtell::catalogue

@@ -1,0 +1,16 @@
+#pragma once
+
+#include "host/session_state.h"
+
+namespace zebtell::orders {
+
+// The basket form beside the price list: clear, change, or go on to the confirmation.
+void Kaubainfo_Tellimus(host::SessionState& state, web::Call& call);
+
+// Only the comments and further fields of the basket's rows.
+void Kaubainfo_MuudaRead(host::SessionState& state, web::Call& call);
+
+// Begins an order with the header fields of the form.
+void Kaubainfo_UusTellimus(host::SessionState& state, web::Call& call);
+
+}  // namespace zebtell::orders

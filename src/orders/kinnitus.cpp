@@ -1,0 +1,147 @@
+#include "orders/kinnitus.h"
+
+#include "base/runtime_error.h"
+#include "base/text.h"
+#include "host/errors.h"
+#include "orders/basket_rows.h"
+#include "orders/header_fields.h"
+#include "orders/refusals.h"
+#include "orders/row_block.h"
+#include "tags/field_text.h"
+#include "tags/order_view.h"
+#include "tags/page_tags.h"
+
+namespace zebtell::orders {
+namespace {
+
+using host::SessionState;
+using tags::TagCall;
+
+constexpr std::string_view kRowNumbers[] = {"Amount", "Quantity", "UnitPrice"};
+constexpr std::string_view kHeaderNumbers[] = {"Amount"};
+
+bool KinnitRida(TagCall& c) {
+    const auto& rows = c.state.basket.BasketRows;
+    return BasketRowBlock(c, "ZEB:KinnitRida", rows ? rows->Count() : 0);
+}
+
+bool OrderRow(TagCall& c) {
+    tags::WriteField(c, c.state.basket_form.CurrentBasketRow.get(), kRowNumbers);
+    return true;
+}
+
+bool Order(TagCall& c) {
+    data::Document* basket = c.state.basket.Basket.get();
+    if (basket != nullptr && base::EqualNoCase(tags::Reference(c), "Explanation")) {
+        tags::WritePlainField(c, *basket->Header(), "Explanation");
+        return true;
+    }
+    tags::WriteField(c, basket == nullptr ? nullptr : basket->Header().get(), kHeaderNumbers);
+    return true;
+}
+
+// Reserved: the contents stand as they are.
+bool MaksuRida(TagCall& c) {
+    c.tag.Show();
+    return true;
+}
+
+void NewBasket(SessionState& state) {
+    data::DiscardBasket(state.basket);
+    EnsureBasket(state);
+}
+
+void OpenStoredOrder(SessionState& state, std::string_view id) {
+    state.confirmation.ShownOrderFilter = "ID=" + std::string(id);
+    state.basket_form.ReturnPage = "Kaubainfo";
+    data::LoadOrderAsBasket(state.application(), state.confirmation.ShownOrderFilter, state.basket);
+}
+
+void CopyRow(SessionState& state, data::Record& row, Refusals& refusals) {
+    if (row.Status(data::kFixedRow)) return;
+    const double quantity = row.GetField("Quantity").ToDouble();
+    const auto add = [&] {
+        AddBasketRow(state.basket, row.GetField("IDGRArticle").ToInteger64(), quantity, {});
+    };
+    const auto refuse = [&] {
+        const auto settings = state.settings();
+        refusals.Add(row.GetField("GRArticle.Code").ToPlainText(),
+                     base::Value(quantity).ToText(settings->region()));
+    };
+    host::Guarded(state, "Kinnitus_UserEvent", add, refuse);
+}
+
+void CopyStoredOrder(SessionState& state, std::string_view id) {
+    data::ShownDocument stored;
+    data::LoadShownOrder(state.application(), "ID=" + std::string(id), stored);
+    NewBasket(state);
+    state.basket_form.ReturnPage = "Kaubainfo";
+    Refusals refusals;
+    for (std::int64_t n = 1; n <= stored.Rows->Count(); ++n) {
+        CopyRow(state, *stored.Rows->Item(n), refusals);
+    }
+    refusals.Tell(state);
+}
+
+void ShowPage(SessionState& state, web::Call& call) {
+    host::SetNoCache(call);
+    host::OrErrorPage(state, call, [&] { call.WriteTemplate(); });
+}
+
+}  // namespace
+
+void Kinnitus_Respond(SessionState& state, web::Call& call) {
+    if (!host::CheckLogon(state, call)) return;
+    state.basket_form.BasketRowCursor = 1;
+    state.basket_form.CurrentBasketRow.reset();
+    ShowPage(state, call);
+}
+
+void Kinnitus_ProcessTag(SessionState& state, web::Call& call, markup::Tag& tag) {
+    tags::ProcessPageTag(state, call, tag, "Kinnitus_ProcessTag", "Kinnitus", &KinnitusTagTable());
+}
+
+void Kinnitus_UserEvent(SessionState& state, web::Call& call, std::string_view event) {
+    if (!host::CheckLogon(state, call)) return;
+    const auto work = [&] {
+        if (base::EqualNoCase(event, "New")) {
+            NewBasket(state);
+        } else if (base::StartsWithNoCase(event, "ID_")) {
+            OpenStoredOrder(state, event.substr(3));
+        } else if (base::StartsWithNoCase(event, "COPY_")) {
+            CopyStoredOrder(state, event.substr(5));
+        }
+    };
+    host::Guarded(state, "Kinnitus_UserEvent", work, [&] {
+        state.Message = "Probleem andmete lugemisel, proovige uuesti!";
+    });
+    call.NextItem("Kinnitus");
+}
+
+void Kinnitatud_Respond(SessionState& state, web::Call& call) {
+    if (!host::CheckLogon(state, call)) return;
+    host::Guarded(state, "Kinnitatud_Respond", [&] { tags::ReadShownOrder(state); });
+    tags::RewindOrderView(state);
+    ShowPage(state, call);
+}
+
+void Kinnitatud_ProcessTag(SessionState& state, web::Call& call, markup::Tag& tag) {
+    tags::ProcessPageTag(
+        state, call, tag, "Kinnitatud_ProcessTag", "Kinnitatud", &tags::OrderViewTagTable());
+}
+
+void Kinnitatud_UserEvent(SessionState& state, web::Call& call, std::string_view) {
+    Kinnitatud_Respond(state, call);
+}
+
+const tags::TagTable& KinnitusTagTable() {
+    static const tags::TagTable kTable{
+        {"ZEB:KinnitRida", KinnitRida, "contents once for each row of the basket"},
+        {"ZEB:SDOrderRow", OrderRow, "a field of the row; prices and sums with two decimals"},
+        {"ZEB:SDOrder", Order, "a field of the order; Explanation as plain text"},
+        {"ZEB:MaksuRida", MaksuRida, "contents as they are"},
+    };
+    return kTable;
+}
+
+}  // namespace zebtell::orders

@@ -1,0 +1,173 @@
+#include "orders/wanted_articles.h"
+
+#include <limits>
+#include <unordered_map>
+
+#include "base/text.h"
+#include "tags/custom_func.h"
+#include "tags/form_values.h"
+#include "tags/price_query.h"
+
+namespace zebtell::orders {
+namespace {
+
+using base::Currency;
+using data::Record;
+using host::SessionState;
+
+std::string Joined(const std::vector<std::string>& items) {
+    std::string text;
+    for (const std::string& item : items) {
+        if (!text.empty()) text += ',';
+        text += item;
+    }
+    return text;
+}
+
+std::string Quoted(std::string_view text) {
+    return "'" + base::Replaced(text, "'", "''") + "'";
+}
+
+Currency PostedPrice(const web::Request& request, const std::string& field) {
+    const auto number = base::ParseNumber(tags::CleanFormValue(request.Form[field]));
+    return number ? Currency::FromDouble(*number) : Currency();
+}
+
+bool IsRowID(std::string_view text) {
+    constexpr std::size_t kLongestID = 18;
+    return !text.empty() && text.size() <= kLongestID &&
+           text.find_first_not_of("0123456789") == std::string_view::npos;
+}
+
+// A wish before its article is known: by the price line's ID, or by code or barcode.
+struct Wish {
+    WantedArticle wanted;
+    std::string row_id;
+};
+
+// False when the box is empty or 0; a quantity that is none goes to the refusals.
+bool TakeQuantity(SessionState& state, WantedArticle& wanted, Refusals& refusals) {
+    if (wanted.typed.empty()) return false;
+    const bool is_number = tags::ParseQuantity(state, wanted.typed, wanted.quantity);
+    if (is_number && wanted.quantity > 0 && wanted.quantity <= kMostQuantity) return true;
+    if (!is_number || wanted.quantity != 0) refusals.Add(wanted.name, wanted.typed);
+    return false;
+}
+
+std::vector<Wish> RowWishes(const web::Request& request) {
+    std::vector<Wish> wishes;
+    for (const web::Field& field : request.Form) {
+        const std::string name = tags::CleanFormValue(field.name);
+        if (!base::StartsWithNoCase(name, "ID_") || !IsRowID(name.substr(3))) continue;
+        Wish wish;
+        wish.row_id = name.substr(3);
+        wish.wanted.typed = tags::CleanFormValue(field.value);
+        if (wish.wanted.typed.empty()) continue;
+        wish.wanted.asked = {PostedPrice(request, "Price_" + wish.row_id),
+                             PostedPrice(request, "UPrice_" + wish.row_id)};
+        wishes.push_back(std::move(wish));
+    }
+    return wishes;
+}
+
+std::vector<Wish> CodeWishes(const web::Request& request) {
+    std::vector<Wish> wishes;
+    for (std::int16_t n = 1; n < std::numeric_limits<std::int16_t>::max(); ++n) {
+        if (!request.Form.Has("Code_f" + std::to_string(n))) break;
+        Wish wish;
+        wish.wanted.name = tags::ReadRowField(request, "Code", n);
+        wish.wanted.typed = tags::ReadRowField(request, "Quantity", n);
+        if (!wish.wanted.name.empty()) wishes.push_back(std::move(wish));
+    }
+    return wishes;
+}
+
+void TakeRow(Wish& wish, Record& row) {
+    wish.wanted.article = row.GetField("IDGRArticle").ToInteger64();
+    wish.wanted.name = row.GetField("GRArticle.Code").ToPlainText();
+}
+
+void FindRows(SessionState& state, std::vector<Wish>& wishes) {
+    if (wishes.empty()) return;
+    std::vector<std::string> ids;
+    for (const Wish& wish : wishes) ids.push_back(wish.row_id);
+    const auto rows =
+        state.application().OpenList("GRPriceListRel", "ID in (" + Joined(ids) + ")", "");
+    for (Wish& wish : wishes) {
+        if (const auto row = rows->Find("ID=" + wish.row_id)) TakeRow(wish, *row);
+    }
+}
+
+void FindCodes(SessionState& state, std::vector<Wish>& wishes) {
+    if (wishes.empty()) return;
+    std::vector<std::string> codes;
+    for (const Wish& wish : wishes) codes.push_back(Quoted(wish.wanted.name));
+    const std::string list = Joined(codes);
+    const auto rows = state.application().OpenList(
+        "GRPriceListRel",
+        "{GRPriceListRel.ID in (select P5.ID from SQPriceList5 P5 inner join GRArticle on "
+        "P5.IDGRArticle=GRArticle.ID where IDGRPriceList=" +
+            std::to_string(state.company.PriceListId) + " and (GRArticle.Code in (" + list +
+            ") or GRArticle.Barcode in (" + list + ")))}",
+        "");
+    std::unordered_map<std::string, std::shared_ptr<Record>, base::NoCaseHash, base::NoCaseEqual>
+        by_code;
+    for (std::int64_t i = 1; i <= rows->Count(); ++i) {
+        const auto row = rows->Item(i);
+        for (const char* field : {"GRArticle.Code", "GRArticle.Barcode"}) {
+            by_code.emplace(row->GetField(field).ToPlainText(), row);
+        }
+    }
+    for (Wish& wish : wishes) {
+        const auto found = by_code.find(wish.wanted.name);
+        if (found != by_code.end()) TakeRow(wish, *found->second);
+    }
+}
+
+// The customer's own price of each article that no price was asked for.
+void TakePrices(SessionState& state, std::vector<WantedArticle>& wanted) {
+    std::vector<std::string> articles;
+    for (const WantedArticle& each : wanted) articles.push_back(std::to_string(each.article));
+    if (articles.empty()) return;
+    const std::int32_t customer = state.company.CustomerKey;
+    const auto prices =
+        state.application().OpenQuery(tags::BuildPriceQuery(state.templates.PriceQueryText,
+                                                            customer,
+                                                            customer,
+                                                            state.company.PriceListId,
+                                                            Joined(articles)),
+                                      0,
+                                      0);
+    for (WantedArticle& each : wanted) {
+        if (each.asked.price != Currency()) continue;
+        const auto row = prices->Find("idgrarticle=" + std::to_string(each.article));
+        const base::Value price = row ? row->GetField("FinalPrice") : base::Value();
+        if (!price.IsBlank()) each.asked.price = price.ToCurrency();
+    }
+}
+
+}  // namespace
+
+std::vector<WantedArticle> ReadWantedArticles(SessionState& state,
+                                              const web::Request& request,
+                                              Refusals& refusals) {
+    std::vector<Wish> rows = RowWishes(request);
+    std::vector<Wish> codes = CodeWishes(request);
+    FindRows(state, rows);
+    FindCodes(state, codes);
+    std::vector<WantedArticle> wanted;
+    for (auto* wishes : {&rows, &codes}) {
+        for (Wish& wish : *wishes) {
+            if (!TakeQuantity(state, wish.wanted, refusals)) continue;
+            if (wish.wanted.article == 0) {
+                refusals.Add(wish.wanted.name, wish.wanted.typed);
+            } else {
+                wanted.push_back(std::move(wish.wanted));
+            }
+        }
+    }
+    TakePrices(state, wanted);
+    return wanted;
+}
+
+}  // namespace zebtell::orders
