@@ -1,0 +1,336 @@
+// A buyer's week against a running portal with the demo company: the address comes in ZEBTELL_URL.
+import assert from 'node:assert/strict';
+import { after, before, test } from 'node:test';
+import { Visitor, cents, openBrowser } from './portal.mjs';
+
+const pageLength = 20;
+let browser;
+
+before(async () => (browser = await openBrowser()));
+after(async () => browser?.close());
+
+// A visitor of his own for each test; leaving checks what the portal sent meanwhile.
+function visit(title, steps) {
+  test(title, { timeout: 120_000 }, async (t) => {
+    const visitor = await Visitor.enter(browser);
+    await steps(visitor, t);
+    await visitor.leave();
+  });
+}
+
+const total = (amounts) => amounts.map(cents).reduce((sum, amount) => sum + amount, 0);
+const isSorted = (numbers) => numbers.every((n, i) => i === 0 || numbers[i - 1] <= n);
+
+async function enterAsMari(visitor) {
+  await visitor.logOn('mari', 'mari-demo');
+  await visitor.openCatalogue();
+}
+
+visit('a buyer finds articles', async (visitor, t) => {
+  const { page } = visitor;
+  await visitor.logOn('mari', 'mari-demo');
+  assert.match(await visitor.heading(), /^Tere, .+!$/);
+
+  await t.test('the catalogue opens with what was bought before', async () => {
+    await visitor.openCatalogue();
+    const group = page.getByLabel('Kaubagrupp').locator('option:checked');
+    assert.equal(await group.innerText(), 'Varem ostetud');
+    assert.ok((await visitor.rows()).length > 0);
+  });
+
+  await t.test('a category is shown page by page', async () => {
+    await visitor.search('');
+    await visitor.press('Otsi');
+    const first = await visitor.rows();
+    assert.equal(first.length, pageLength);
+    assert.ok(isSorted(first.map((row) => row.code)), 'sorted by code at first');
+    const leaf = page.getByText(/^Leht \d+ \/ \d+$/);
+    const count = Number((await leaf.innerText()).split('/')[1]);
+    assert.ok(count > 2);
+
+    await page.getByRole('link', { name: 'Järgmine' }).click();
+    assert.equal(await leaf.innerText(), `Leht 2 / ${count}`);
+    const second = await visitor.rows();
+    assert.ok(second[0].code > first.at(-1).code);
+    await page.getByRole('link', { name: 'Viimane leht' }).click();
+    assert.equal(await leaf.innerText(), `Leht ${count} / ${count}`);
+    assert.equal(await page.getByRole('link', { name: 'Järgmine' }).count(), 0);
+    await page.getByRole('link', { name: 'Esimene leht' }).click();
+    assert.deepEqual(await visitor.rows(), first);
+  });
+
+  await t.test('a group holds fewer articles than all groups', async () => {
+    const groups = await page.getByLabel('Kaubagrupp').locator('option').allInnerTexts();
+    const group = groups.find((name) => !['Kõik kaubagrupid', 'Varem ostetud'].includes(name));
+    const all = await visitor.rows();
+    await visitor.search('', group);
+    const some = await visitor.rows();
+    assert.ok(some.length > 0);
+    assert.notDeepEqual(some, all);
+    const chosen = page.getByLabel('Kaubagrupp').locator('option:checked');
+    assert.equal(await chosen.innerText(), group);
+  });
+
+  await t.test('sorting by price turns round', async () => {
+    const prices = async () => (await visitor.rows()).map((row) => cents(row.Hind));
+    await visitor.press('Hind');
+    const rising = await prices();
+    assert.ok(isSorted(rising), rising.join(' '));
+    const header = page.getByRole('columnheader', { name: 'Hind', exact: true });
+    assert.equal(await header.getAttribute('aria-sort'), 'ascending');
+    await visitor.press('Hind');
+    assert.ok(isSorted((await prices()).reverse()));
+    assert.equal(await header.getAttribute('aria-sort'), 'descending');
+  });
+
+  await t.test('search finds by the beginning of the code and by words of the name', async () => {
+    await visitor.openCatalogue();
+    const [sample] = await visitor.rows();
+    await visitor.search(sample.code);
+    assert.ok((await visitor.rows()).some((row) => row.code === sample.code));
+    const words = sample.name.split(/\s+/).slice(0, 2);
+    await visitor.search(words.join(' '));
+    const found = await visitor.rows();
+    const holds = (row, word) => row.name.toLowerCase().includes(word.toLowerCase());
+    assert.ok(found.length > 0);
+    assert.ok(found.every((row) => words.every((word) => holds(row, word))));
+  });
+
+  await t.test('what was typed is shown as typed, and nothing found is said', async () => {
+    const typed = '<b id="x">tühi</b> & "jutt"';
+    await visitor.search(typed);
+    assert.equal(await page.getByLabel('Kood või nimetus').inputValue(), typed);
+    assert.equal(await page.locator('#x').count(), 0);
+    assert.equal((await visitor.rows()).length, 0);
+    await page.getByRole('heading', { name: 'Siin ei ole ühtegi kaupa' }).waitFor();
+  });
+
+  await t.test('an article has a page of its own', async () => {
+    await visitor.search('');
+    const [sample] = await visitor.rows();
+    await page.getByRole('link', { name: sample.name, exact: true }).first().click();
+    assert.equal(await visitor.heading(), sample.name);
+    assert.equal(await visitor.value('Kood'), sample.code);
+    await visitor.press('Hind ja tellimine');
+    assert.ok((await visitor.rows()).some((row) => row.code === sample.code));
+  });
+});
+
+visit('a buyer orders', async (visitor, t) => {
+  const { page } = visitor;
+  await enterAsMari(visitor);
+  let chosen;
+  let number;
+
+  await t.test('typed quantities go to the basket at the own price', async () => {
+    chosen = (await visitor.rows()).slice(0, 2);
+    await visitor.order(['2', '3']);
+    const expected = [2 * cents(chosen[0].own), 3 * cents(chosen[1].own)];
+    assert.deepEqual((await visitor.basketSums()).map(cents), expected);
+    assert.equal(cents(await visitor.value('Kokku ilma km-ta')), expected[0] + expected[1]);
+  });
+
+  await t.test('the same article again gets more quantity, not a second row', async () => {
+    await visitor.order(['1']);
+    assert.deepEqual((await visitor.basketSums()).map(cents), [
+      3 * cents(chosen[0].own),
+      3 * cents(chosen[1].own),
+    ]);
+  });
+
+  await t.test('quantities and comments are changed in the basket', async () => {
+    const basket = visitor.basket();
+    await basket.getByLabel('Kogus').first().fill('5');
+    await basket.getByLabel('Märkus').nth(1).fill('<i>lõigata</i> 1,2 m');
+    await visitor.press('Muuda');
+    assert.equal(await basket.getByLabel('Kogus').first().inputValue(), '5');
+    assert.equal(await basket.getByLabel('Märkus').nth(1).inputValue(), '<i>lõigata</i> 1,2 m');
+    const sums = await visitor.basketSums();
+    assert.equal(cents(sums[0]), 5 * cents(chosen[0].own));
+    assert.equal(cents(await visitor.value('Kokku ilma km-ta')), total(sums));
+  });
+
+  await t.test('quick entry adds by code and names what it does not know', async () => {
+    const known = (await visitor.rows())[2];
+    await page.getByText('Kiirsisestus koodi järgi').click();
+    await page.getByLabel('Kood, 1. rida').fill(known.code);
+    await page.getByLabel('Kogus, 1. rida').fill('1,5');
+    await page.getByLabel('Kood, 2. rida').fill('<puudub>');
+    await page.getByLabel('Kogus, 2. rida').fill('1');
+    await visitor.press('Lisa koodid korvi');
+    assert.ok((await visitor.message()).includes('<puudub>'));
+    assert.equal((await visitor.basketSums()).length, 3);
+    assert.equal(await visitor.basket().getByLabel('Kogus').nth(2).inputValue(), '1,5');
+  });
+
+  await t.test('a row is taken out', async () => {
+    await visitor.basket().getByRole('link', { name: /^Eemalda/ }).nth(2).click();
+    assert.equal(await visitor.heading(), 'Korv');
+    assert.deepEqual(
+      (await visitor.rows()).map((row) => row.code),
+      chosen.map((row) => row.code),
+    );
+    await visitor.press('Lisa ridu');
+  });
+
+  await t.test('the pages fit phones, tablets and screens', async () => {
+    await visitor.photograph('kaubad');
+    for (const name of ['Raamistik', 'Koostamine', 'Kinnitus', 'Kasutaja', 'Yld', 'Vasak']) {
+      await visitor.go(`page=${name}`);
+      await visitor.photograph(name.toLowerCase());
+    }
+    await visitor.openCatalogue();
+  });
+
+  await t.test('going back from the confirmation keeps what was typed', async () => {
+    await visitor.press('Vormista');
+    await page.getByLabel('Soovitud tarnepäev').fill('2030-03-07');
+    await page.getByLabel('Märkused müüjale').fill('Helistada </textarea> enne');
+    await visitor.press('Tagasi');
+    assert.equal(await visitor.heading(), 'Kaubad');
+    await visitor.press('Vormista');
+    assert.equal(await page.getByLabel('Soovitud tarnepäev').inputValue(), '2030-03-07');
+    const comment = await page.getByLabel('Märkused müüjale').inputValue();
+    assert.equal(comment, 'Helistada </textarea> enne');
+  });
+
+  await t.test('Enter in a field does not store or drop the order', async () => {
+    await page.getByLabel('Soovitud tarnepäev').press('Enter');
+    assert.equal(await visitor.heading(), 'Tellimuse kinnitamine');
+    assert.equal((await visitor.rows()).length, 2);
+  });
+
+  await t.test('the confirmed order is stored with its number and sums', async () => {
+    const net = cents(await visitor.value('Ilma käibemaksuta'));
+    const gross = cents(await visitor.value('Tasuda'));
+    await visitor.press('Kinnita tellimus');
+    assert.match(await page.getByRole('status').innerText(), /tellimus on vastu võetud/);
+    const heading = await visitor.heading();
+    number = heading.replace('Tellimus ', '');
+    assert.match(number, /\d/);
+    const rows = await visitor.rows();
+    assert.deepEqual(
+      rows.map((row) => [row.code, row.Kogus]),
+      [
+        [chosen[0].code, '5'],
+        [chosen[1].code, '3'],
+      ],
+    );
+    assert.equal(cents(rows[0].Summa), 5 * cents(chosen[0].own));
+    assert.ok(rows[1].name.includes('<i>lõigata</i> 1,2 m'));
+    assert.equal(total(rows.map((row) => row.Summa)), net);
+    assert.equal(cents(await visitor.value('Ilma käibemaksuta')), net);
+    assert.equal(cents(await visitor.value('Tasuda')), gross);
+    const taxes = await page.locator('dl > div', { hasText: /^Käibemaks/ }).locator('dd').allInnerTexts();
+    assert.equal(net + total(taxes), gross);
+    assert.equal(await visitor.value('Soovitud tarnepäev'), '07.03.2030');
+    assert.equal(await visitor.value('Märkused'), 'Helistada </textarea> enne');
+    await visitor.photograph('tellimus');
+  });
+
+  await t.test('the thanks are said once and the basket is gone', async () => {
+    await page.reload();
+    assert.equal(await visitor.heading(), `Tellimus ${number}`);
+    assert.equal(await page.getByRole('status').count(), 0);
+    await visitor.go('page=Koostamine');
+    await page.getByText('Korvis ei ole ühtegi rida').waitFor();
+  });
+
+  await t.test('an order is ordered again and dropped', async () => {
+    await visitor.go('page=Tellimus');
+    await page.getByRole('link', { name: 'Telli uuesti' }).click();
+    assert.equal(await visitor.heading(), 'Tellimuse kinnitamine');
+    assert.deepEqual(
+      (await visitor.rows()).map((row) => [row.code, row.Kogus]),
+      [
+        [chosen[0].code, '5'],
+        [chosen[1].code, '3'],
+      ],
+    );
+    await page.getByText('Kustuta tellimus…').click();
+    await visitor.press('Kustuta tellimus');
+    assert.equal(await visitor.heading(), 'Kaubad');
+    await page.getByText('Korv on tühi').waitFor();
+  });
+
+  await t.test('a single article is added on its own page', async () => {
+    await page.setViewportSize({ width: 1366, height: 900 });
+    await page.getByRole('link', { name: /^Lisa eraldi/ }).first().click();
+    assert.equal(await visitor.heading(), 'Kauba lisamine');
+    await visitor.photograph('lisamine');
+    await page.getByLabel('Kogus').fill('4');
+    await visitor.press('Lisa korvi');
+    assert.match(await page.getByRole('status').innerText(), /Rida on korvis/);
+    await page.getByRole('link', { name: 'Vaata korvi' }).click();
+    const [row] = await visitor.rows();
+    assert.equal(row.code, chosen[0].code);
+    assert.equal(cents(row.Summa), 4 * cents(chosen[0].own));
+    await page.getByText('Loobu tellimusest…').click();
+    await visitor.press('Loobu tellimusest');
+    await page.getByText('Korvis ei ole ühtegi rida').waitFor();
+  });
+
+  await t.test('after logging out an old link leads to the log-on page', async () => {
+    await page.getByRole('link', { name: 'Logi välja' }).first().click();
+    assert.equal(await visitor.heading(), 'Olete välja loginud');
+    await visitor.photograph('logout');
+    await visitor.go('page=Kaubainfo');
+    assert.equal(await visitor.message(), 'Sessioon katkestatud - sisenege uuesti!');
+    assert.equal(await visitor.heading(), 'Sisenemine');
+    await visitor.photograph('logon');
+  });
+});
+
+visit('a guest orders with name and address', async (visitor, t) => {
+  const { page } = visitor;
+  await visitor.press('Sisene külalisena');
+  await page.getByText('Külaline', { exact: true }).waitFor();
+  await visitor.openCatalogue();
+  await visitor.search('');
+  const [article] = await visitor.rows();
+  await visitor.order(['1']);
+  await visitor.press('Vormista');
+
+  await t.test('without a name nothing is sent', async () => {
+    await visitor.press('Kinnita tellimus');
+    assert.equal(await visitor.heading(), 'Tellimuse kinnitamine');
+  });
+
+  await t.test('the order carries name and address', async () => {
+    await page.getByLabel('Nimi').fill('Jüri Õunapuu');
+    await page.getByLabel('Aadress').fill('Pärna 7, Tartu');
+    await visitor.press('Kinnita tellimus');
+    assert.match(await visitor.heading(), /^Tellimus .*\d/);
+    assert.equal(await visitor.value('Tellija'), 'Jüri Õunapuu');
+    assert.equal(await visitor.value('Aadress'), 'Pärna 7, Tartu');
+    assert.deepEqual((await visitor.rows()).map((row) => row.code), [article.code]);
+  });
+});
+
+visit('a company that may not order sees prices only', async (visitor) => {
+  await visitor.logOn('blokk', 'blokk-demo');
+  await visitor.openCatalogue();
+  await visitor.search('');
+  await visitor.page.getByText('Tellimine ei ole praegu lubatud').waitFor();
+  assert.equal((await visitor.rows()).length, pageLength);
+  assert.equal(await visitor.page.locator('input[name^="ID_"]').count(), 0);
+});
+
+visit('wrong passwords block the session', async (visitor) => {
+  const attempts = 10;
+  await visitor.logOn('mari', 'vale');
+  assert.equal(await visitor.message(), 'Vale kasutajanimi või parool!');
+  for (let i = 0; i < attempts && !/blokeeritud/.test(await visitor.message()); i++) {
+    await visitor.logOn('mari', 'vale');
+  }
+  assert.match(await visitor.message(), /^Sessioon blokeeritud, proovige uuesti \d+ minuti pärast!$/);
+  await visitor.logOn('mari', 'mari-demo');
+  assert.match(await visitor.message(), /blokeeritud/);
+});
+
+visit('pages that anybody may open show nothing of a customer', async (visitor) => {
+  for (const name of ['Raamistik', 'Vasak', 'Kasutaja', 'Lisatud']) {
+    await visitor.go(`page=${name}`);
+    assert.doesNotMatch(await visitor.page.locator('body').innerText(), /mari|OÜ|€/i);
+  }
+});
