@@ -1,0 +1,95 @@
+#include "erp/logon.h"
+
+#include <optional>
+#include <string>
+
+#include "base/runtime_error.h"
+#include "base/text.h"
+#include "erp/password.h"
+
+namespace zebtell::erp {
+namespace {
+
+constexpr const char* kUserSql =
+    "SELECT u.ID, u.PasswordHash, u.Guest, u.Disabled, u.IDPartner, u.IDGRCompContPerson, "
+    "c.IDSettlCompany, c.IDParent, c.IDEREmployee, c.IDGRCompanyPriceCat, "
+    "c.IDGRPriceList, s.IDGRPriceList "
+    "FROM SYUser u LEFT JOIN GRCompany c ON c.ID = u.IDPartner "
+    "LEFT JOIN GRCompany s ON s.ID = c.IDSettlCompany WHERE u.Name = ?";
+
+struct User {
+    Reader reader;
+    std::string hash;
+    bool disabled = false;
+    std::int64_t price_list = 0;  // 0: neither the partner nor who pays for it has one
+};
+
+std::optional<User> ReadUser(Connection& connection, std::string_view name) {
+    const auto row = connection.Query({kUserSql, {name}});
+    if (!row->Next()) {
+        return std::nullopt;
+    }
+    User user;
+    user.reader.user = row->GetInteger(0);
+    user.hash = row->Get(1).ToPlainText();
+    user.reader.role = row->GetInteger(2) != 0 ? Role::kGuest : Role::kUser;
+    user.disabled = row->GetInteger(3) != 0;
+    user.reader.partner = row->GetInteger(4);
+    user.reader.contact = row->GetInteger(5);
+    user.reader.settlement_company = row->GetInteger(6);
+    user.reader.parent = row->GetInteger(7);
+    user.reader.employee = row->GetInteger(8);
+    user.reader.price_category = row->GetInteger(9);
+    const std::int64_t own = row->GetInteger(10);
+    user.price_list = own != 0 ? own : row->GetInteger(11);
+    return user;
+}
+
+// Databases compare names without regard to case, though not all of them letters beyond ASCII.
+std::optional<std::string> NameInOtherCase(Connection& connection, std::string_view name) {
+    const auto row = connection.Query({"SELECT Name FROM SYUser", {}});
+    while (row->Next()) {
+        std::string known = row->Get(0).ToPlainText();
+        if (base::EqualNoCase(known, name)) {
+            return known;
+        }
+    }
+    return std::nullopt;
+}
+
+std::optional<User> FindUser(CompanyDatabase& database, std::string_view name) {
+    const Lease connection = database.pool().Read();
+    std::optional<User> user = ReadUser(*connection, name);
+    if (!user) {
+        const auto known = NameInOtherCase(*connection, name);
+        user = known ? ReadUser(*connection, *known) : std::nullopt;
+    }
+    return user;
+}
+
+}  // namespace
+
+Reader LogOn(CompanyDatabase& database, std::string_view user, std::string_view password) {
+    const std::optional<User> found = FindUser(database, user);
+    const bool right = IsPassword(password, found ? found->hash : std::string());
+    if (!right || found->disabled) {
+        throw base::RuntimeError(base::errors::kLogonFailed, "Unknown user or wrong password");
+    }
+    Reader reader = found->reader;
+    reader.price_lists =
+        found->price_list != 0 ? std::vector{found->price_list} : DefaultPriceLists(database);
+    return reader;
+}
+
+std::vector<std::int64_t> DefaultPriceLists(CompanyDatabase& database) {
+    const Lease connection = database.pool().Read();
+    const auto row =
+        connection->Query({"SELECT ID FROM GRPriceList WHERE IsDefault = 1 ORDER BY ID", {}});
+    std::vector<std::int64_t> lists;
+    while (row->Next()) {
+        lists.push_back(row->GetInteger(0));
+    }
+    return lists;
+}
+
+}  // namespace zebtell::erp

@@ -1,0 +1,59 @@
+#pragma once
+
+#include <cstdint>
+#include <memory>
+#include <span>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "base/clock.h"
+#include "erp/access.h"
+#include "erp/company_database.h"
+#include "erp/key_table.h"
+#include "erp/row_set.h"
+
+namespace zebtell::erp {
+
+// A logged-on reader of a company database: what every list, record and document of one session
+// reads through. Used by one thread at a time.
+class Session {
+  public:
+    Session(std::shared_ptr<CompanyDatabase> database, Reader reader, base::Clock clock)
+        : database_(std::move(database)), reader_(std::move(reader)), clock_(std::move(clock)) {}
+
+    CompanyDatabase& database() const { return *database_; }
+    const Schema& schema() const { return database_->schema(); }
+    const Reader& reader() const { return reader_; }
+    const base::Clock& clock() const { return clock_; }
+
+    // From now on the reader sees this document, which he has just stored.
+    void AddSavedDocument(std::int64_t id) { reader_.saved_documents.push_back(id); }
+
+    // The keys of a table's rows, with the columns that its records were looked up by so far and
+    // `find_column` ("": no other).
+    std::shared_ptr<const KeyTable> Keys(const TableInfo& table,
+                                         std::string_view filter,
+                                         std::string_view order,
+                                         std::string_view find_column = {});
+
+    // The rows of these keys, in their order, with all fields that the table's records were asked
+    // for so far and `field` ("": no other).
+    std::shared_ptr<const RowSet> Rows(const TableInfo& table,
+                                       std::span<const std::int64_t> ids,
+                                       std::string_view field = {});
+
+    // The result of a select statement.
+    std::shared_ptr<const RowSet> Query(std::string_view sql);
+
+  private:
+    template <class Read>
+    auto Shared(char kind, const BoundSql& sql, Read&& read);
+    std::string ReaderKey(const TableInfo& table) const;
+
+    std::shared_ptr<CompanyDatabase> database_;
+    Reader reader_;
+    base::Clock clock_;
+};
+
+}  // namespace zebtell::erp
