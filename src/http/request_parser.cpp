@@ -162,7 +162,8 @@ bool NamesOtherVersion(std::string_view request_line) {
     if (version == std::string_view::npos) return false;
     const std::string_view name = request_line.substr(version + 1, 8);
     return name.size() == 8 && name.starts_with("HTTP/") && IsDigits(name.substr(5, 1)) &&
-           name[6] == '.' && IsDigits(name.substr(7, 1));
+           name[6] == '.' && IsDigits(name.substr(7, 1)) && name != "HTTP/1.1" &&
+           name != "HTTP/1.0";
 }
 
 }  // namespace

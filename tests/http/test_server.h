@@ -1,0 +1,48 @@
+#pragma once
+
+#include <memory>
+#include <string>
+#include <utility>
+
+#include "http/server.h"
+#include "tests/support/raw_client.h"
+
+namespace zebtell::http {
+
+using zebtell::testing::RawClient;
+using zebtell::testing::RawResponse;
+
+inline ServerOptions TwoThreads() {
+    ServerOptions options;
+    options.io_threads = 2;
+    return options;
+}
+
+// "GET|/path?query|body" of whatever is asked.
+inline void Echo(const Request& request, const Responder& respond) {
+    Response response;
+    response.body = request.method + "|" + request.target + "|" + request.body;
+    respond(std::move(response));
+}
+
+// A started server on a free port.
+struct TestServer {
+    explicit TestServer(Handler handler = Echo, ServerOptions options = TwoThreads())
+        : server(std::move(options), std::move(handler)) {
+        server.Start();
+    }
+    Server server;
+    RawClient Connect() const { return RawClient(server.port()); }
+};
+
+inline std::string Get(const std::string& target, const std::string& headers = "") {
+    return "GET " + target + " HTTP/1.1\r\nHost: shop\r\n" + headers + "\r\n";
+}
+
+inline std::string Post(const std::string& target, const std::string& body) {
+    return "POST " + target +
+           " HTTP/1.1\r\nHost: shop\r\nContent-Length: " + std::to_string(body.size()) +
+           "\r\n\r\n" + body;
+}
+
+}  // namespace zebtell::http
