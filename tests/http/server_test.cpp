@@ -193,7 +193,9 @@ TEST(Responder, MayBeCalledAfterTheClientAndTheServerHaveGone) {
     Held held;
     Responder kept;
     {
-        TestServer test(held.handler());
+        ServerOptions options = TwoThreads();
+        options.timeouts.stop = milliseconds(50);
+        TestServer test(held.handler(), std::move(options));
         RawClient client = test.Connect();
         client.Send(Get("/"));
         const Responder respond = held.Take();
