@@ -58,6 +58,7 @@ class Call {
 
     // For the page runtime.
     void SetPage(std::string_view page_name) { page_name_ = page_name; }
+    bool HasNextItem() const { return !next_item_.empty(); }
     std::string TakeNextItem() { return std::exchange(next_item_, {}); }
     bool release_instance() const { return release_instance_; }
     bool renew_token() const { return renew_token_; }
