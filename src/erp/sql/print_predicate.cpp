@@ -1,0 +1,145 @@
+#include "base/date_time.h"
+#include "erp/sql/errors.h"
+#include "erp/sql/policy_scopes.h"
+#include "erp/sql/print.h"
+
+namespace zebtell::erp::sql {
+namespace {
+
+// A date written as a text, compared with one that the database holds.
+void TurnIntoDate(const Expr& written, ValueType compared_with, BoundSql& printed) {
+    const auto* literal = std::get_if<Literal>(&written.node);
+    const auto* text = literal ? literal->value.As<std::string>() : nullptr;
+    if (text && compared_with == ValueType::kDate && printed.text == "?") {
+        if (const auto date = base::DateTime::FromIso(*text)) {
+            printed.values.back() = *date;
+        }
+    }
+}
+
+struct PredicatePrinter {
+    Context& context;
+    Scope& scope;
+    BoundSql& out;
+
+    bool operator()(const Comparison& comparison) const {
+        BoundSql left;
+        BoundSql right;
+        const ValueType left_type = PrintValue(context, *comparison.left, scope, left);
+        const ValueType right_type = PrintValue(context, *comparison.right, scope, right);
+        TurnIntoDate(*comparison.left, right_type, left);
+        TurnIntoDate(*comparison.right, left_type, right);
+        Append(out, std::move(left));
+        out.text.append(" ").append(comparison.operation).append(" ");
+        Append(out, std::move(right));
+        return true;
+    }
+
+    bool operator()(const Like& like) const {
+        BoundSql operand;
+        BoundSql pattern;
+        PrintOperand(context, *like.operand, scope, operand);
+        {
+            const Temporarily<bool> in_pattern(context.in_pattern, true);
+            PrintOperand(context, *like.pattern, scope, pattern);
+        }
+        if (!like.negated && pattern.text == "?" && pattern.values[0] == base::Value("%")) {
+            Append(out, std::move(operand));  // any text at all: nothing to look at
+            out.text += " is not null";
+        } else if (context.dialect == Dialect::kSqlite) {
+            out.text += like.negated ? "not erp_like(" : "erp_like(";
+            Append(out, std::move(operand));
+            out.text += ", ";
+            Append(out, std::move(pattern));
+            out.text += ')';
+        } else {
+            Append(out, std::move(operand));
+            out.text += like.negated ? " not like " : " like ";
+            Append(out, std::move(pattern));
+            out.text += " escape '\\'";
+        }
+        return true;
+    }
+
+    bool operator()(const In& in) const {
+        const ValueType type = PrintOperand(context, *in.operand, scope, out);
+        out.text += in.negated ? " not" : "";
+        if (const auto* json = std::get_if<std::string>(&in.set)) {
+            AppendInJson(out, *json, context.dialect, type == ValueType::kText);
+        } else if (const auto* select = std::get_if<SelectPtr>(&in.set)) {
+            out.text += " in (";
+            const auto columns = PrintSelect(context, **select, &scope, SelectUse::kValues, out);
+            if (columns.size() != 1) {
+                Fail("The select behind \"in\" has to give one column");
+            }
+            out.text += ')';
+        } else {
+            PrintValues(std::get<std::vector<ExprPtr>>(in.set), type);
+        }
+        return true;
+    }
+
+    bool operator()(const Between& between) const {
+        const ValueType type = PrintOperand(context, *between.operand, scope, out);
+        out.text += between.negated ? " not between " : " between ";
+        PrintCompared(*between.low, type);
+        out.text += " and ";
+        PrintCompared(*between.high, type);
+        return true;
+    }
+
+    bool operator()(const IsNull& is_null) const {
+        PrintOperand(context, *is_null.operand, scope, out);
+        out.text += is_null.negated ? " is not null" : " is null";
+        return true;
+    }
+
+    template <class Other>
+    bool operator()(const Other&) const {
+        return false;
+    }
+
+    void PrintValues(const std::vector<ExprPtr>& values, ValueType type) const {
+        const auto* parameter = std::get_if<Parameter>(&values.front()->node);
+        if (parameter && values.size() == 1) {
+            ReaderValue list = ValueOf(context.reader, parameter->name);
+            AppendInJson(out, list.value.text(), context.dialect, false);
+            return;
+        }
+        std::string_view glue = " in (";
+        for (const ExprPtr& value : values) {
+            out.text += glue;
+            PrintCompared(*value, type);
+            glue = ", ";
+        }
+        out.text += ')';
+    }
+
+    void PrintCompared(const Expr& value, ValueType with) const {
+        BoundSql printed;
+        PrintOperand(context, value, scope, printed);
+        TurnIntoDate(value, with, printed);
+        Append(out, std::move(printed));
+    }
+};
+
+}  // namespace
+
+bool TryPrintPredicate(Context& context, const Expr& condition, Scope& scope, BoundSql& out) {
+    Joins children;
+    BoundSql printed;
+    {
+        const Temporarily<Joins*> within(context.children, &children);
+        if (!std::visit(PredicatePrinter{context, scope, printed}, condition.node)) {
+            return false;
+        }
+    }
+    if (children.tables.empty()) {
+        Append(out, std::move(printed));
+    } else {
+        PrintChildren(context, children, std::move(printed), out);
+    }
+    return true;
+}
+
+}  // namespace zebtell::erp::sql

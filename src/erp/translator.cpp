@@ -1,0 +1,168 @@
+#include "erp/translator.h"
+
+#include "base/text.h"
+#include "erp/sql/errors.h"
+#include "erp/sql/parser.h"
+#include "erp/sql/print.h"
+
+namespace zebtell::erp {
+namespace {
+
+using sql::Context;
+using sql::Style;
+
+// The condition of a filter, without the braces that mark it as SQL.
+std::string_view ConditionOf(std::string_view filter) {
+    constexpr std::string_view kBlanks = " \t\r\n";
+    const std::size_t begin = filter.find_first_not_of(kBlanks);
+    if (begin == std::string_view::npos) {
+        return {};
+    }
+    filter = filter.substr(begin, filter.find_last_not_of(kBlanks) - begin + 1);
+    if (filter.front() != '{') {
+        return filter;
+    }
+    if (filter.back() != '}') {
+        sql::Fail("The closing brace is missing", filter);
+    }
+    return filter.substr(1, filter.size() - 2);
+}
+
+sql::Path PathOf(std::string_view dotted) {
+    return {base::Split(dotted, '.')};
+}
+
+// A select of the key and fields of one table.
+class TableSelect {
+  public:
+    TableSelect(const Schema& schema, Dialect dialect, const Reader& reader, std::string_view table)
+        : context_(schema, dialect, reader, Style::kFilter), source_(context_.names.Open(table)) {
+        context_.names.Add(source_, source_.table->name, scope_);
+        items_.text = "select ";
+        AddField("ID");
+        if (sql::PrintRowScope(context_, source_, " where ", where_)) {
+            glue_ = " and ";
+        }
+    }
+
+    void AddFields(std::span<const std::string> fields) {
+        for (const std::string& field : fields) {
+            items_.text += ", ";
+            AddField(field);
+        }
+    }
+
+    void AddCondition(std::string_view condition) {
+        if (!condition.empty()) {
+            const sql::ExprPtr parsed = sql::Parser(condition, Style::kFilter).ParseCondition();
+            where_.text += NextGlue();
+            sql::PrintAndPart(context_, *parsed, scope_, where_);
+        }
+    }
+
+    void AddIDs(std::span<const std::int64_t> ids) {
+        where_.text += NextGlue();
+        PrintPath(PathOf("ID"), where_);
+        sql::AppendInJson(where_, sql::JsonList(ids), context_.dialect, false);
+    }
+
+    // By the key at last, so that the order is always the same.
+    void AddOrder(std::string_view order) {
+        bool by_key = false;
+        order_.text = " order by ";
+        if (!order.empty()) {
+            for (const sql::OrderItem& item : sql::Parser(order, Style::kFilter).ParseOrderList()) {
+                by_key = AddOrderItem(item) || by_key;
+                order_.text += ", ";
+            }
+        }
+        if (by_key) {
+            order_.text.resize(order_.text.size() - 2);
+        } else {
+            PrintPath(PathOf("ID"), order_);
+        }
+    }
+
+    BoundSql Statement() {
+        BoundSql out = std::move(items_);
+        out.text += " from ";
+        sql::PrintTable(context_, source_, out);
+        sql::PrintLinks(context_, scope_.joins, out);
+        sql::Append(out, std::move(where_));
+        sql::Append(out, std::move(order_));
+        return out;
+    }
+
+  private:
+    void AddField(std::string_view field) { PrintPath(PathOf(field), items_); }
+
+    std::string_view NextGlue() { return std::exchange(glue_, " and "); }
+
+    void PrintPath(const sql::Path& path, BoundSql& out) {
+        sql::PrintColumn(context_, context_.names.Resolve(path, scope_, nullptr), out);
+    }
+
+    // Whether it is the key.
+    bool AddOrderItem(const sql::OrderItem& item) {
+        const auto* path = std::get_if<sql::Path>(&item.expression->node);
+        if (!path) {
+            sql::Fail("An order is columns or paths, separated by commas");
+        }
+        const auto column = context_.names.Resolve(*path, scope_, nullptr);
+        sql::PrintColumn(context_, column, order_);
+        order_.text += item.descending ? " desc" : "";
+        return column.source == &source_ && base::EqualNoCase(column.name, "ID");
+    }
+
+    Context context_;
+    sql::Scope scope_;
+    sql::Source& source_;
+    BoundSql items_;
+    BoundSql where_;
+    BoundSql order_;
+    std::string_view glue_ = " where ";
+};
+
+}  // namespace
+
+BoundSql Translator::ListKeys(const Reader& reader,
+                              std::string_view table,
+                              std::string_view filter,
+                              std::string_view order,
+                              std::span<const std::string> columns) const {
+    TableSelect select(schema_, dialect_, reader, table);
+    select.AddFields(columns);
+    select.AddCondition(ConditionOf(filter));
+    select.AddOrder(base::Trimmed(order));
+    return select.Statement();
+}
+
+BoundSql Translator::RowsByID(const Reader& reader,
+                              std::string_view table,
+                              std::span<const std::int64_t> ids,
+                              std::span<const std::string> fields) const {
+    TableSelect select(schema_, dialect_, reader, table);
+    select.AddFields(fields);
+    select.AddIDs(ids);
+    return select.Statement();
+}
+
+BoundSql Translator::Select(const Reader& reader, std::string_view sql) const {
+    const sql::SelectPtr select = sql::Parser(sql, Style::kStatement).ParseStatement();
+    Context context(schema_, dialect_, reader, Style::kStatement);
+    BoundSql out;
+    sql::PrintSelect(context, *select, nullptr, sql::SelectUse::kResult, out);
+    return out;
+}
+
+std::vector<std::string> Translator::ReadableColumns(const Reader& reader,
+                                                     std::string_view table) const {
+    sql::Names names(schema_, reader.role);
+    std::vector<std::string> columns;
+    for (const auto& column : sql::Names::ReadableColumns(names.Open(table))) {
+        columns.emplace_back(column.name);
+    }
+    return columns;
+}
+
+}  // namespace zebtell::erp
