@@ -24,17 +24,21 @@ struct DayAndSecond {
     int second;
 };
 
-// To the nearest second; RuntimeError 6 outside the years that a date may have.
-DayAndSecond Parts(double days) {
-    if (!(days > kFirstDay - 1 && days < kLastDay + 1)) throw RuntimeError(errors::kOverflow);
+// To the nearest second; nothing outside the years that a date may have.
+std::optional<DayAndSecond> FindParts(double days) {
+    if (!(days > kFirstDay - 1 && days < kLastDay + 1)) return std::nullopt;
     const double whole = std::trunc(days);
     DayAndSecond parts{static_cast<int>(whole),
                        static_cast<int>(std::lround(std::fabs(days - whole) * kSecondsPerDay))};
-    if (parts.second == kSecondsPerDay) {
-        parts = {parts.day + 1, 0};
-        if (parts.day > kLastDay) throw RuntimeError(errors::kOverflow);
-    }
+    if (parts.second == kSecondsPerDay) parts = {parts.day + 1, 0};
+    if (parts.day > kLastDay) return std::nullopt;
     return parts;
+}
+
+DayAndSecond Parts(double days) {
+    const auto parts = FindParts(days);
+    if (!parts) throw RuntimeError(errors::kOverflow);
+    return *parts;
 }
 
 bool IsTime(const CalendarTime& fields) {
@@ -121,6 +125,10 @@ std::optional<DateTime> DateTime::FromIso(std::string_view text) {
     const auto fields = IsoFields(text);
     if (!fields) return std::nullopt;
     return FromFields(*fields);
+}
+
+bool DateTime::HasCalendar() const {
+    return FindParts(days_).has_value();
 }
 
 CalendarTime DateTime::Calendar() const {

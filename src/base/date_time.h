@@ -33,6 +33,8 @@ class DateTime {
     static std::optional<DateTime> FromIso(std::string_view text);
 
     constexpr double days() const { return days_; }
+    // Whether the days lie in those years. The functions below throw RuntimeError 6 when not.
+    bool HasCalendar() const;
     CalendarTime Calendar() const;  // to the nearest second
     int Weekday() const;            // 1 = Sunday to 7 = Saturday
     DateTime DateOnly() const;

@@ -36,6 +36,13 @@ std::int32_t ToInteger32(double number) {
 }
 
 std::int64_t ToInteger64(double number) {
+    // From 2^53 on a double is whole, and its shortest digits may be another whole number.
+    constexpr double kWholeFrom = 9007199254740992.0;
+    constexpr double kEnd = 9223372036854775808.0;  // 2^63
+    if (number >= kWholeFrom || number <= -kWholeFrom) {
+        if (number >= kEnd || number < -kEnd) throw RuntimeError(errors::kOverflow);
+        return static_cast<std::int64_t>(number);
+    }
     return Decimal::FromDouble(number).ToScaled(0);
 }
 

@@ -45,8 +45,14 @@ std::string GeneralNumber(double number, char decimal_mark) {
 std::string ShortestNumber(double number) {
     if (!std::isfinite(number)) throw RuntimeError(errors::kOverflow);
     if (number == 0) return "0";
+    // Where the plain notation is short, it is what people expect in a log or a key.
+    const double size = std::fabs(number);
     char buffer[40];
-    return {buffer, std::to_chars(buffer, buffer + sizeof buffer, number).ptr};
+    char* const last = buffer + sizeof buffer;
+    const auto end = size >= 1e-5 && size < 1e15
+                         ? std::to_chars(buffer, last, number, std::chars_format::fixed).ptr
+                         : std::to_chars(buffer, last, number).ptr;
+    return {buffer, end};
 }
 
 std::string GeneralDate(DateTime time, const Region& region) {
