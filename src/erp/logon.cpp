@@ -1,5 +1,6 @@
 #include "erp/logon.h"
 
+#include <algorithm>
 #include <optional>
 #include <string>
 
@@ -67,6 +68,20 @@ std::optional<User> FindUser(CompanyDatabase& database, std::string_view name) {
     return user;
 }
 
+// The lines of a list may be those of another one; whoever sees them reads them there.
+void AddSourceLists(CompanyDatabase& database, std::vector<std::int64_t>& lists) {
+    const Lease connection = database.pool().Read();
+    const std::size_t own = lists.size();
+    for (std::size_t i = 0; i < own; ++i) {
+        const auto row =
+            connection->Query({"SELECT IDSrcPriceList FROM GRPriceList WHERE ID = ?", {lists[i]}});
+        const std::int64_t source = row->Next() ? row->GetInteger(0) : 0;
+        if (source != 0 && std::find(lists.begin(), lists.end(), source) == lists.end()) {
+            lists.push_back(source);
+        }
+    }
+}
+
 }  // namespace
 
 Reader LogOn(CompanyDatabase& database, std::string_view user, std::string_view password) {
@@ -78,6 +93,7 @@ Reader LogOn(CompanyDatabase& database, std::string_view user, std::string_view 
     Reader reader = found->reader;
     reader.price_lists =
         found->price_list != 0 ? std::vector{found->price_list} : DefaultPriceLists(database);
+    AddSourceLists(database, reader.price_lists);
     return reader;
 }
 

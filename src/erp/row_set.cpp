@@ -1,5 +1,7 @@
 #include "erp/row_set.h"
 
+#include <algorithm>
+#include <iterator>
 #include <unordered_map>
 
 namespace zebtell::erp {
@@ -17,6 +19,12 @@ void RowSet::Append(const Cursor& cursor) {
     for (std::size_t column = 0; column < fields_->size(); ++column) {
         values_.push_back(cursor.Get(column));
     }
+    missing_.push_back(false);
+    ++count_;
+}
+
+void RowSet::Append(std::vector<base::Value> values) {
+    std::move(values.begin(), values.end(), std::back_inserter(values_));
     missing_.push_back(false);
     ++count_;
 }

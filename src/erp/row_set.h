@@ -27,8 +27,11 @@ class RowSet : public Result {
     // Whether the record of that row is there; its values are null when it is not.
     bool Has(std::size_t row) const { return !missing_[row]; }
 
+    bool HasSameValues(const RowSet& other) const { return values_ == other.values_; }
+
     // The cursor's row as the next row.
     void Append(const Cursor& cursor);
+    void Append(std::vector<base::Value> values);  // one a field
 
     // Rows whose first column is the key, put into the order of `keys`.
     static std::shared_ptr<const RowSet> Arranged(const RowSet& rows,

@@ -1,0 +1,25 @@
+#pragma once
+
+#include <memory>
+
+#include "data/document.h"
+#include "erp/order.h"
+
+namespace zebtell::erp {
+
+// The order as pages edit it. Its records and row list share the order and may outlive this.
+class OrderDocument : public data::Document {
+  public:
+    explicit OrderDocument(std::shared_ptr<Order> order) : order_(std::move(order)) {}
+
+    base::Value GetField(std::string_view name) override;
+    void SetField(std::string_view name, const base::Value& value) override;
+    std::shared_ptr<data::Record> Header() override;
+    std::shared_ptr<data::RecordList> Rows() override;
+    void Save() override;
+
+  private:
+    std::shared_ptr<Order> order_;
+};
+
+}  // namespace zebtell::erp

@@ -1,0 +1,274 @@
+#include "erp/order_saving.h"
+
+#include <algorithm>
+
+#include "base/runtime_error.h"
+#include "erp/order_image.h"
+#include "erp/order_price.h"
+#include "erp/order_sums.h"
+#include "erp/transaction.h"
+#include "erp/write_sql.h"
+
+namespace zebtell::erp {
+namespace {
+
+// What saving gave, for the order in memory.
+struct Stored {
+    std::int64_t id = 0;
+    base::Value number;
+    std::vector<std::int64_t> row_ids;  // by row; 0: not stored
+    std::optional<OrderImage> image;
+};
+
+// What customers change of a stored order; the rest is the staff's.
+constexpr const char* kHeaderColumns[] = {
+    "WantedDate", "IDGRCompContPerson", "CompanyName", "CompanyAddr", "Explanation"};
+constexpr const char* kRowColumns[] = {"IDGRArticle",
+                                       "Quantity",
+                                       "Price",
+                                       "UnitPrice",
+                                       "PriceCut",
+                                       "Amount",
+                                       "TaxPercent",
+                                       "Explanation"};
+
+[[noreturn]] void Refuse(const char* why) {
+    throw base::RuntimeError(base::errors::kInvalidCall, why);
+}
+
+// One save of one order.
+class Saving {
+  public:
+    Saving(Order& order, Connection& connection)
+        : order_(order), session_(*order.session()), connection_(connection) {}
+
+    Stored Run() {
+        stored_.row_ids.assign(order_.rows.size(), 0);
+        if (order_.IsStored()) {
+            StoreAgain();
+        } else if (!IsStoredAlready()) {
+            StoreNew();
+        }
+        stored_.image = Image(stored_.id);
+        return std::move(stored_);
+    }
+
+  private:
+    bool IsStoredAlready();
+    void StoreNew();
+    void StoreAgain();
+    void StoreRows();
+    void RemoveRows();
+    void StoreTaxes();
+    bool NeedsReview();
+    std::optional<OrderImage> Image(std::int64_t id);
+    ColumnValues Sums();
+    ColumnValues ValuesOf(const RecordFields& fields, std::span<const char* const> columns) const;
+
+    Order& order_;
+    Session& session_;
+    Connection& connection_;
+    Stored stored_;
+};
+
+bool Saving::IsStoredAlready() {
+    const auto row =
+        connection_.Query({"SELECT d.ID, o.Number FROM GDocument d "
+                           "INNER JOIN SDOrder o ON o.ID = d.ID WHERE d.DocKey = ?",
+                           {order_.key}});
+    if (!row->Next()) {
+        return false;
+    }
+    stored_.id = row->GetInteger(0);
+    stored_.number = row->GetInteger(1);
+    return true;
+}
+
+void Saving::StoreNew() {
+    if (order_.header.Integer("IDGRCompany") == 0) {
+        Refuse("The order has no company");
+    }
+    connection_.Execute(InsertSql(
+        "GDocument",
+        {{"Kind", kOrderTable}, {"DocKey", order_.key}, {"Created", session_.clock()()}}));
+    stored_.id = connection_.LastIdentity();
+    {
+        const auto last = connection_.Query({"SELECT max(Number) FROM SDOrder", {}});
+        stored_.number = (last->Next() ? last->GetInteger(0) : 0) + 1;
+    }
+    ColumnValues values = ValuesOf(order_.header, kHeaderColumns);
+    for (const char* column : {"DocDate", "State", "IDGRCompany", "IDGRPriceList"}) {
+        values.emplace_back(column, order_.header.Get(column));
+    }
+    values.emplace_back("ID", stored_.id);
+    values.emplace_back("Number", stored_.number);
+    const ColumnValues sums = Sums();
+    values.insert(values.end(), sums.begin(), sums.end());
+    connection_.Execute(InsertSql(kOrderTable, values));
+    StoreRows();
+    StoreTaxes();
+}
+
+void Saving::StoreAgain() {
+    const auto now = Image(order_.id);
+    if (!now) {
+        Refuse("The order is not there any more");
+    }
+    RecordFields header(order_.header.table());
+    header.Take(*now->header, 0);
+    if (header.Integer("State") != 0) {
+        Refuse("The order is being processed and can't be changed");
+    }
+    if (!order_.image || !IsSame(*now, *order_.image)) {
+        Refuse("Somebody else has changed the order");
+    }
+    stored_.id = order_.id;
+    stored_.number = header.Get("Number");
+    ColumnValues values = ValuesOf(order_.header, kHeaderColumns);
+    const ColumnValues sums = Sums();
+    values.insert(values.end(), sums.begin(), sums.end());
+    connection_.Execute(UpdateSql(kOrderTable, order_.id, values));
+    RemoveRows();
+    StoreRows();
+    connection_.Execute({"DELETE FROM GDTax WHERE IDGDocument = ?", {order_.id}});
+    StoreTaxes();
+}
+
+void Saving::RemoveRows() {
+    for (const std::int64_t id : order_.image->row_ids) {
+        const bool kept =
+            std::any_of(order_.rows.begin(), order_.rows.end(), [id](const auto& row) {
+                return row->id == id && (row->IsFixed() || row->IsToStore());
+            });
+        if (!kept) {
+            connection_.Execute({"DELETE FROM SDOrderRow WHERE ID = ?", {id}});
+        }
+    }
+}
+
+void Saving::StoreRows() {
+    for (std::size_t i = 0; i < order_.rows.size(); ++i) {
+        const OrderRow& row = *order_.rows[i];
+        if (row.IsFixed()) {
+            stored_.row_ids[i] = row.id;
+            continue;
+        }
+        if (!row.IsToStore()) {
+            continue;
+        }
+        ColumnValues values = ValuesOf(row.fields, kRowColumns);
+        if (row.id > 0) {
+            connection_.Execute(UpdateSql(kOrderRowTable, row.id, values));
+            stored_.row_ids[i] = row.id;
+            continue;
+        }
+        values.emplace_back(kOrderRowLink, stored_.id);
+        values.emplace_back("RowNo", row.fields.Get("RowNo"));
+        connection_.Execute(InsertSql(kOrderRowTable, values));
+        stored_.row_ids[i] = connection_.LastIdentity();
+    }
+}
+
+void Saving::StoreTaxes() {
+    for (const TaxLine& line : SumsOf(order_).taxes) {
+        connection_.Execute(InsertSql("GDTax",
+                                      {{"IDGDocument", stored_.id},
+                                       {"TaxPercent", line.percent},
+                                       {"Base", line.base},
+                                       {"Amount", line.amount}}));
+    }
+}
+
+// Whether a row costs less than the customer's own price as it is now. The row is stored as asked.
+bool Saving::NeedsReview() {
+    std::vector<std::int64_t> articles;
+    for (const auto& row : order_.rows) {
+        articles.push_back(row->fields.Integer("IDGRArticle"));
+    }
+    const Reader& reader = session_.reader();
+    const auto cursor = connection_.Query(
+        session_.database().translator().Select(reader, OwnPricesSql(reader, articles)));
+    RowSet rows(std::make_shared<const FieldSet>(cursor->Columns()));
+    while (cursor->Next()) {
+        rows.Append(*cursor);
+    }
+    const OwnPrices prices = ReadOwnPrices(reader, rows);
+    return std::any_of(order_.rows.begin(), order_.rows.end(), [&](const auto& row) {
+        if (row->IsFixed() || !row->IsToStore()) {
+            return false;
+        }
+        const auto own = prices.find(row->fields.Integer("IDGRArticle"));
+        return own == prices.end() || row->fields.Money("Price") < own->second.price ||
+               row->fields.Money("Amount") <
+                   base::Multiplied(own->second.price, row->fields.Number("Quantity"), 2);
+    });
+}
+
+// Also of an order that the reader sees only from now on.
+std::optional<OrderImage> Saving::Image(std::int64_t id) {
+    Reader reader = session_.reader();
+    if (!order_.IsStored()) {
+        reader.saved_documents.push_back(id);
+    }
+    return ReadOrderImage(session_.database().translator(), reader, connection_, id);
+}
+
+ColumnValues Saving::Sums() {
+    const OrderSums sums = SumsOf(order_);
+    return {{"Amount", sums.amount},
+            {"TaxAmount", sums.tax_amount},
+            {"AmountWTax", sums.with_tax()},
+            {"NeedsReview", NeedsReview()}};
+}
+
+ColumnValues Saving::ValuesOf(const RecordFields& fields,
+                              std::span<const char* const> columns) const {
+    ColumnValues values;
+    for (const char* column : columns) {
+        values.emplace_back(column, fields.Get(column));
+    }
+    return values;
+}
+
+void Recalculate(Order& order) {
+    for (const auto& row : order.rows) {
+        if (row->changed) {
+            order.UpdateRow(*row);
+        }
+    }
+    const bool has_rows = std::any_of(
+        order.rows.begin(), order.rows.end(), [](const auto& row) { return row->IsToStore(); });
+    if (!has_rows) {
+        Refuse("The order has no rows");
+    }
+}
+
+void Take(Order& order, Stored stored) {
+    const bool is_new = !order.IsStored();
+    order.id = stored.id;
+    order.header.Set("Number", stored.number);
+    for (std::size_t i = 0; i < order.rows.size(); ++i) {
+        const std::int64_t id = stored.row_ids[i];
+        order.rows[i]->id = id != 0 ? id : order.NewRowId();
+    }
+    order.image = std::move(stored.image);
+    order.changed = false;
+    if (is_new) {
+        order.session()->AddSavedDocument(order.id);
+    }
+}
+
+}  // namespace
+
+void SaveOrder(Order& order) {
+    if (order.IsStored() && !order.changed) {
+        return;
+    }
+    Recalculate(order);
+    Transaction transaction(order.session()->database().pool());
+    Stored stored = Saving(order, transaction.connection()).Run();
+    transaction.Commit();
+    Take(order, std::move(stored));
+}
+
+}  // namespace zebtell::erp

@@ -1,0 +1,13 @@
+#pragma once
+
+#include "erp/order.h"
+
+namespace zebtell::erp {
+
+// Stores the order in one transaction, all or nothing; the order in memory is changed only when
+// that has succeeded. An unsaved order whose key is in the database takes the stored ID and number.
+// RuntimeError 5 when there is nothing to store, when staff have begun to process the stored order
+// or somebody has changed it.
+void SaveOrder(Order& order);
+
+}  // namespace zebtell::erp

@@ -1,0 +1,38 @@
+#pragma once
+
+#include "erp/connection_pool.h"
+
+namespace zebtell::erp {
+
+// A write transaction: rolled back unless it is committed.
+class Transaction {
+  public:
+    explicit Transaction(ConnectionPool& pool) : lease_(pool.Write()) { lease_->Begin(); }
+    ~Transaction() {
+        if (!committed_) {
+            lease_->Rollback();
+        }
+    }
+    Transaction(const Transaction&) = delete;
+    Transaction& operator=(const Transaction&) = delete;
+
+    Connection& connection() const { return *lease_; }
+
+    // Throws when the database did not say that all is stored; never tried again, since it may be
+    // stored all the same.
+    void Commit() {
+        try {
+            lease_->Commit();
+        } catch (...) {
+            lease_.Drop();
+            throw;
+        }
+        committed_ = true;
+    }
+
+  private:
+    Lease lease_;
+    bool committed_ = false;
+};
+
+}  // namespace zebtell::erp
