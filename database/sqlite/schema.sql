@@ -131,8 +131,8 @@ CREATE TABLE GRPriceListRel (
     -- 0: not priced.
     Price MONEY NOT NULL CHECK (Price >= 0)
 );
--- Both hold the whole line, so that reading a list never visits the table itself.
-CREATE UNIQUE INDEX GRPriceListRel_List ON GRPriceListRel(IDGRPriceList, IDGRArticle, Price);
+CREATE UNIQUE INDEX GRPriceListRel_List ON GRPriceListRel(IDGRPriceList, IDGRArticle);
+-- With the price, so that the prices of some articles are read without the lines themselves.
 CREATE INDEX GRPriceListRel_Article ON GRPriceListRel(IDGRArticle, IDGRPriceList, Price);
 
 -- What a company price category pays for an article price category, in per cent on the list price.

@@ -52,49 +52,70 @@ std::string CodePart(std::string_view size, std::size_t least_digits) {
     return part;
 }
 
-std::string WithSize(std::string_view name, const std::string& size) {
-    return name.find('%') == std::string_view::npos ? std::string(name) + " " + size
-                                                    : base::Replaced(name, "%", size);
-}
+// One of the combinations of a kind.
+struct Choice {
+    std::string_view name;
+    std::string_view size;
+    std::string_view length;
+    std::string_view finish;
+    std::size_t variant;  // among the articles of that size and length
+    std::size_t series;   // how often the combination has come before
+    int size_per_mille;
+};
 
-}  // namespace
-
-ArticleName NameOf(const ArticleKind& kind, int number) {
+Choice ChoiceOf(const ArticleKind& kind, std::size_t number) {
     const Parts names = PartsOf(kind.names);
     const Parts sizes = PartsOf(kind.sizes);
     const Parts lengths = PartsOf(kind.lengths);
     const Parts finishes = PartsOf(kind.finishes);
     const std::size_t all = names.size() * sizes.size() * lengths.size() * finishes.size();
-    const auto position = static_cast<std::size_t>(number);
     constexpr std::size_t kStride = 7919;  // a prime, so that it visits every combination once
 
-    std::size_t rest = position * kStride % all;
+    std::size_t rest = number * kStride % all;
     const std::size_t size = TakeDigit(rest, sizes);
     const std::size_t name = TakeDigit(rest, names);
-    const std::string_view length = lengths[TakeDigit(rest, lengths)];
+    const std::size_t length = TakeDigit(rest, lengths);
     const std::size_t finish = TakeDigit(rest, finishes);
-    const std::size_t series = position / all;
-    const std::size_t variant = (series * names.size() + name) * finishes.size() + finish;
+    const std::size_t series = number / all;
+    return {names[name],
+            sizes[size],
+            lengths[length],
+            finishes[finish],
+            (series * names.size() + name) * finishes.size() + finish,
+            series,
+            static_cast<int>(size * 1000 / sizes.size())};
+}
 
-    ArticleName result;
-    result.size_per_mille = static_cast<int>(size * 1000 / sizes.size());
-    result.code = std::string(kind.code) + "-" + CodePart(sizes[size], 1);
-    std::string measure(sizes[size]);
-    if (!length.empty()) {
-        result.code += "-" + CodePart(length, 3);
-        measure.append("×").append(length);
+std::string CodeOf(const ArticleKind& kind, const Choice& choice) {
+    std::string code = std::string(kind.code) + "-" + CodePart(choice.size, 1);
+    if (!choice.length.empty()) {
+        code += "-" + CodePart(choice.length, 3);
     }
-    if (variant != 0) {
-        result.code += "-" + std::to_string(variant);
+    return choice.variant == 0 ? code : code + "-" + std::to_string(choice.variant);
+}
+
+std::string WithSize(std::string_view name, const std::string& size) {
+    return name.find('%') == std::string_view::npos ? std::string(name) + " " + size
+                                                    : base::Replaced(name, "%", size);
+}
+
+std::string FullName(const Choice& choice) {
+    std::string measure(choice.size);
+    if (!choice.length.empty()) {
+        measure.append("×").append(choice.length);
     }
-    result.name = WithSize(names[name], measure);
-    if (!finishes[finish].empty()) {
-        result.name.append(" ").append(finishes[finish]);
+    std::string name = WithSize(choice.name, measure);
+    if (!choice.finish.empty()) {
+        name.append(" ").append(choice.finish);
     }
-    if (series != 0) {
-        result.name += ", " + MakerOf(series);
-    }
-    return result;
+    return choice.series == 0 ? name : name + ", " + MakerOf(choice.series);
+}
+
+}  // namespace
+
+ArticleName NameOf(const ArticleKind& kind, int number) {
+    const Choice choice = ChoiceOf(kind, static_cast<std::size_t>(number));
+    return {CodeOf(kind, choice), FullName(choice), choice.size_per_mille};
 }
 
 std::string Ean13(std::int64_t first_digits) {

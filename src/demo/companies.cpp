@@ -53,8 +53,9 @@ Registration RegistrationIn(std::string_view country, Random& random) {
 }
 
 std::string PhoneIn(std::string_view country, Random& random) {
-    const std::string_view prefix = country == "LV" ? "+371 " : country == "FI" ? "+358 " : "+372 ";
-    return std::string(prefix) + Digits(random, 3) + " " + Digits(random, 4);
+    std::string phone = country == "LV" ? "+371 " : country == "FI" ? "+358 " : "+372 ";
+    phone += Digits(random, 3);
+    return phone + " " + Digits(random, 4);
 }
 
 std::string CompanyCode(std::int64_t id) {
@@ -77,7 +78,6 @@ std::int64_t ListThatCounts(const CompanyRow& row) {
         row.parent == 0 || row.price_list != 0 ? row.price_list : RowOf(row.parent).price_list;
     return list == 0 ? kBaseList : list;
 }
-
 void WriteSellers(const DatabaseFile& file, Random& random) {
     Insert employees(file, "EREmployee", {"ID", "Name", "Phone", "Email"});
     int id = 0;
@@ -149,6 +149,8 @@ Buyer CompanyWriter::Write(std::int64_t id) {
     const Registration registration = RegistrationIn(town.country, random_);
     const std::string address =
         std::string(town.street) + " " + std::to_string(random_.Between(1, 98));
+    const std::string phone = PhoneIn(town.country, random_);
+    const int seller = random_.Between(1, static_cast<int>(std::size(kSellers)));
 
     Buyer buyer;
     buyer.id = id;
@@ -165,7 +167,7 @@ Buyer CompanyWriter::Write(std::int64_t id) {
                    town.city,
                    town.post_code,
                    town.country,
-                   PhoneIn(town.country, random_),
+                   phone,
                    MailAddress("info", id),
                    row.price_cut,
                    buyer.may_order,
@@ -174,7 +176,7 @@ Buyer CompanyWriter::Write(std::int64_t id) {
                    Link{row.parent},
                    Link{row.parent},
                    static_cast<int>(row.group),
-                   random_.Between(1, static_cast<int>(std::size(kSellers))));
+                   seller);
     buyer.contact = id == kRetailCompany ? 0 : WritePeople(id, town.country);
     return buyer;
 }
@@ -193,11 +195,9 @@ std::int64_t CompanyWriter::WritePeople(std::int64_t company, std::string_view c
         }
         const std::string name =
             std::string(first_name) + " " + std::string(random_.Pick(names.last));
-        people_.Row(company,
-                    name,
-                    random_.Pick(kPositions),
-                    PhoneIn(country, random_),
-                    MailAddress("isik" + std::to_string(++last_person_), company));
+        const std::string_view position = random_.Pick(kPositions);
+        const std::string mail = MailAddress("isik" + std::to_string(++last_person_), company);
+        people_.Row(company, name, position, PhoneIn(country, random_), mail);
     }
     return first;
 }

@@ -16,7 +16,7 @@ int AppendIndex(void* statements, int, char** values, char**) {
     return 0;
 }
 
-std::string InsertText(std::string_view table, std::initializer_list<std::string_view> columns) {
+std::string InsertText(std::string_view table, const std::vector<std::string_view>& columns) {
     std::string names;
     std::string marks;
     for (std::string_view column : columns) {
@@ -65,7 +65,7 @@ void DatabaseFile::Finish() {
 
 Insert::Insert(const DatabaseFile& file,
                std::string_view table,
-               std::initializer_list<std::string_view> columns) {
+               const std::vector<std::string_view>& columns) {
     const std::string text = InsertText(table, columns);
     sqlite3_stmt* statement = nullptr;
     const int result = sqlite3_prepare_v2(file.handle(), text.c_str(), -1, &statement, nullptr);

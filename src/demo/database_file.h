@@ -4,10 +4,10 @@
 
 #include <cstdint>
 #include <filesystem>
-#include <initializer_list>
 #include <memory>
 #include <string>
 #include <string_view>
+#include <vector>
 
 #include "base/currency.h"
 #include "base/date_time.h"
@@ -45,7 +45,7 @@ class Insert {
   public:
     Insert(const DatabaseFile& file,
            std::string_view table,
-           std::initializer_list<std::string_view> columns);
+           const std::vector<std::string_view>& columns);
 
     // One row; the values are given in the order of the columns.
     template <class... Values>

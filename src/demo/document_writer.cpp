@@ -1,13 +1,13 @@
 #include "demo/document_writer.h"
 
 #include <string>
+#include <vector>
 
 namespace zebtell::demo {
 namespace {
 
 using base::Currency;
-
-constexpr int kOfficeHour = 9;
+using Columns = std::vector<std::string_view>;
 
 std::string KeyText(Random& random) {
     constexpr std::string_view kDigits = "0123456789abcdef";
@@ -21,9 +21,9 @@ std::string KeyText(Random& random) {
     return text;
 }
 
-base::DateTime SomeTimeOf(base::DateTime date, Random& random) {
+base::DateTime OfficeTimeOf(base::DateTime date, Random& random) {
     base::CalendarTime time = date.Calendar();
-    time.hour = kOfficeHour + random.Below(8);
+    time.hour = random.Between(9, 16);
     time.minute = random.Below(60);
     time.second = random.Below(60);
     return base::DateTime::FromCalendar(time);
@@ -36,165 +36,135 @@ Currency PaidOf(const TradeDocument& invoice, const DocumentSums& sums) {
 
 }  // namespace
 
+DocumentWriter::Kind DocumentWriter::MakeKind(const DatabaseFile& file,
+                                              const KindColumns& columns) {
+    Columns header = {"ID",
+                      "Number",
+                      "DocDate",
+                      "State",
+                      "IDGRCompany",
+                      "IDGRCompContPerson",
+                      "IDGRPriceList",
+                      "CompanyName",
+                      "CompanyAddr",
+                      "Explanation",
+                      "Amount",
+                      "TaxAmount",
+                      "AmountWTax"};
+    header.insert(header.end(), columns.own.begin(), columns.own.end());
+    const Columns row = {"ID",
+                         columns.row_link,
+                         "RowNo",
+                         "IDGRArticle",
+                         "Quantity",
+                         "Price",
+                         "UnitPrice",
+                         "PriceCut",
+                         "Amount",
+                         "TaxPercent",
+                         "Explanation",
+                         "Status",
+                         columns.row_own};
+    return {columns.table,
+            Insert(file, columns.table, header),
+            Insert(file, columns.row_table, row),
+            columns.last_number};
+}
+
 DocumentWriter::DocumentWriter(const DatabaseFile& file)
     : documents_(file, "GDocument", {"ID", "Kind", "DocKey", "Created"}),
       relations_(file, "GDocRel", {"IDGDocument", "IDSrcGDocument"}),
       taxes_(file, "GDTax", {"IDGDocument", "TaxPercent", "Base", "Amount"}),
-      // clang-format off
-      orders_(file, "SDOrder",
-              {"ID", "Number", "DocDate", "WantedDate", "State", "IDGRCompany",
-               "IDGRCompContPerson", "IDGRPriceList", "CompanyName", "CompanyAddr", "Explanation",
-               "Amount", "TaxAmount", "AmountWTax", "NeedsReview"}),
-      order_rows_(file, "SDOrderRow",
-                  {"ID", "IDSDOrder", "RowNo", "IDGRArticle", "Quantity", "Price", "UnitPrice",
-                   "PriceCut", "Amount", "TaxPercent", "Explanation", "DeliveredQuantity",
-                   "Status"}),
-      deliveries_(file, "SDConsignmD",
-                  {"ID", "Number", "DocDate", "State", "IDGRCompany", "IDGRCompContPerson",
-                   "IDGRPriceList", "CompanyName", "CompanyAddr", "Explanation", "Amount",
-                   "TaxAmount", "AmountWTax"}),
-      delivery_rows_(file, "DDStoreDRow",
-                     {"ID", "IDSDConsignmD", "RowNo", "IDSDOrderRow", "IDGRArticle", "Quantity",
-                      "Price", "UnitPrice", "PriceCut", "Amount", "TaxPercent", "Explanation",
-                      "Status"}),
-      invoices_(file, "SDInvoice",
-                {"ID", "Number", "DocDate", "DueDate", "State", "IDGRCompany",
-                 "IDGRCompContPerson", "IDGRPriceList", "CompanyName", "CompanyAddr",
-                 "Explanation", "Amount", "TaxAmount", "AmountWTax", "PaidAmount"}),
-      invoice_rows_(file, "SDInvoiceRow",
-                    {"IDSDInvoice", "RowNo", "IDDDStoreDRow", "IDGRArticle", "Quantity", "Price",
-                     "UnitPrice", "PriceCut", "Amount", "TaxPercent", "Explanation", "Status"})
-// clang-format on
-{}
+      orders_(MakeKind(file,
+                       {"SDOrder",
+                        {"WantedDate", "NeedsReview"},
+                        "SDOrderRow",
+                        "IDSDOrder",
+                        "DeliveredQuantity",
+                        100'000})),
+      deliveries_(MakeKind(
+          file, {"SDConsignmD", {}, "DDStoreDRow", "IDSDConsignmD", "IDSDOrderRow", 200'000})),
+      invoices_(MakeKind(file,
+                         {"SDInvoice",
+                          {"DueDate", "PaidAmount"},
+                          "SDInvoiceRow",
+                          "IDSDInvoice",
+                          "IDDDStoreDRow",
+                          260'000})) {}
 
-void DocumentWriter::Begin(TradeDocument& document, std::string_view kind) {
+DocumentSums DocumentWriter::Begin(TradeDocument& document, Kind& kind) {
     document.id = ++last_document_;
-    documents_.Row(document.id, kind, KeyText(keys_), SomeTimeOf(document.date, keys_));
+    document.number = ++kind.last_number;
+    const std::string key = KeyText(random_);
+    documents_.Row(document.id, kind.name, key, OfficeTimeOf(document.date, random_));
     if (document.source != 0) {
         relations_.Row(document.id, document.source);
     }
-}
-
-void DocumentWriter::WriteTaxes(const TradeDocument& document, const DocumentSums& sums) {
+    DocumentSums sums = SumsOf(document.rows);
     for (const TaxLine& line : sums.taxes) {
         taxes_.Row(document.id, line.percent, line.base, line.amount);
+    }
+    return sums;
+}
+
+template <class... Own>
+void DocumentWriter::WriteHeader(Kind& kind,
+                                 const TradeDocument& document,
+                                 const DocumentSums& sums,
+                                 const Own&... own) {
+    kind.headers.Row(document.id,
+                     document.number,
+                     document.date,
+                     document.state,
+                     document.buyer->id,
+                     Link{document.buyer->contact},
+                     document.buyer->price_list,
+                     document.company_name,
+                     document.company_address,
+                     document.explanation,
+                     sums.amount,
+                     sums.tax,
+                     sums.amount + sums.tax,
+                     own...);
+}
+
+template <class OwnOf>
+void DocumentWriter::WriteRows(Kind& kind, TradeDocument& document, OwnOf own_of) {
+    int row_no = 0;
+    for (TradeRow& row : document.rows) {
+        row.id = ++kind.last_row;
+        kind.rows.Row(row.id,
+                      document.id,
+                      ++row_no,
+                      row.article->id,
+                      row.quantity,
+                      row.price,
+                      row.list_price,
+                      row.price_cut,
+                      row.amount,
+                      row.article->tax_percent,
+                      row.explanation,
+                      row.status,
+                      own_of(row));
     }
 }
 
 void DocumentWriter::WriteOrder(TradeDocument& order) {
-    Begin(order, "SDOrder");
-    order.number = ++last_order_;
-    const DocumentSums sums = SumsOf(order.rows);
-    const Buyer& buyer = *order.buyer;
-    orders_.Row(order.id,
-                order.number,
-                order.date,
-                order.wanted,
-                order.state,
-                buyer.id,
-                Link{buyer.contact},
-                buyer.price_list,
-                order.company_name,
-                order.company_address,
-                order.explanation,
-                sums.amount,
-                sums.tax,
-                sums.amount + sums.tax,
-                order.needs_review);
-    int row_no = 0;
-    for (TradeRow& row : order.rows) {
-        row.id = ++last_order_row_;
-        order_rows_.Row(row.id,
-                        order.id,
-                        ++row_no,
-                        row.article->id,
-                        row.quantity,
-                        row.price,
-                        row.list_price,
-                        row.price_cut,
-                        row.amount,
-                        row.article->tax_percent,
-                        row.explanation,
-                        row.delivered,
-                        row.status);
-    }
-    WriteTaxes(order, sums);
+    const DocumentSums sums = Begin(order, orders_);
+    WriteHeader(orders_, order, sums, order.wanted, order.needs_review);
+    WriteRows(orders_, order, [](const TradeRow& row) { return row.delivered; });
 }
 
 void DocumentWriter::WriteDelivery(TradeDocument& delivery) {
-    Begin(delivery, "SDConsignmD");
-    delivery.number = ++last_delivery_;
-    const DocumentSums sums = SumsOf(delivery.rows);
-    const Buyer& buyer = *delivery.buyer;
-    deliveries_.Row(delivery.id,
-                    delivery.number,
-                    delivery.date,
-                    delivery.state,
-                    buyer.id,
-                    Link{buyer.contact},
-                    buyer.price_list,
-                    delivery.company_name,
-                    delivery.company_address,
-                    delivery.explanation,
-                    sums.amount,
-                    sums.tax,
-                    sums.amount + sums.tax);
-    int row_no = 0;
-    for (TradeRow& row : delivery.rows) {
-        row.id = ++last_delivery_row_;
-        delivery_rows_.Row(row.id,
-                           delivery.id,
-                           ++row_no,
-                           row.source_row,
-                           row.article->id,
-                           row.quantity,
-                           row.price,
-                           row.list_price,
-                           row.price_cut,
-                           row.amount,
-                           row.article->tax_percent,
-                           row.explanation,
-                           row.status);
-    }
-    WriteTaxes(delivery, sums);
+    const DocumentSums sums = Begin(delivery, deliveries_);
+    WriteHeader(deliveries_, delivery, sums);
+    WriteRows(deliveries_, delivery, [](const TradeRow& row) { return Link{row.source_row}; });
 }
 
 void DocumentWriter::WriteInvoice(TradeDocument& invoice) {
-    Begin(invoice, "SDInvoice");
-    invoice.number = ++last_invoice_;
-    const DocumentSums sums = SumsOf(invoice.rows);
-    const Buyer& buyer = *invoice.buyer;
-    invoices_.Row(invoice.id,
-                  invoice.number,
-                  invoice.date,
-                  invoice.due,
-                  invoice.state,
-                  buyer.id,
-                  Link{buyer.contact},
-                  buyer.price_list,
-                  invoice.company_name,
-                  invoice.company_address,
-                  invoice.explanation,
-                  sums.amount,
-                  sums.tax,
-                  sums.amount + sums.tax,
-                  PaidOf(invoice, sums));
-    int row_no = 0;
-    for (const TradeRow& row : invoice.rows) {
-        invoice_rows_.Row(invoice.id,
-                          ++row_no,
-                          row.source_row,
-                          row.article->id,
-                          row.quantity,
-                          row.price,
-                          row.list_price,
-                          row.price_cut,
-                          row.amount,
-                          row.article->tax_percent,
-                          row.explanation,
-                          row.status);
-    }
-    WriteTaxes(invoice, sums);
+    const DocumentSums sums = Begin(invoice, invoices_);
+    WriteHeader(invoices_, invoice, sums, invoice.due, PaidOf(invoice, sums));
+    WriteRows(invoices_, invoice, [](const TradeRow& row) { return Link{row.source_row}; });
 }
 
 }  // namespace zebtell::demo

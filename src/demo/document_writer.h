@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <initializer_list>
 #include <string_view>
 
 #include "demo/database_file.h"
@@ -20,26 +21,43 @@ class DocumentWriter {
     void WriteInvoice(TradeDocument& invoice);
 
   private:
-    // The key, the GDocument and the links to the document before.
-    void Begin(TradeDocument& document, std::string_view kind);
-    void WriteTaxes(const TradeDocument& document, const DocumentSums& sums);
+    // One kind of document.
+    struct Kind {
+        std::string_view name;
+        Insert headers;
+        Insert rows;
+        std::int64_t last_number;
+        std::int64_t last_row = 0;
+    };
+    // The columns that only this kind has come behind those that all have.
+    struct KindColumns {
+        std::string_view table;
+        std::initializer_list<std::string_view> own;
+        std::string_view row_table;
+        std::string_view row_link;  // the column that leads from a row to its document
+        std::string_view row_own;
+        std::int64_t last_number;
+    };
+    static Kind MakeKind(const DatabaseFile& file, const KindColumns& columns);
+
+    // The GDocument, the link to the document before and the taxes.
+    DocumentSums Begin(TradeDocument& document, Kind& kind);
+    template <class... Own>
+    void WriteHeader(Kind& kind,
+                     const TradeDocument& document,
+                     const DocumentSums& sums,
+                     const Own&... own);
+    template <class OwnOf>
+    void WriteRows(Kind& kind, TradeDocument& document, OwnOf own_of);
 
     Insert documents_;
     Insert relations_;
     Insert taxes_;
-    Insert orders_;
-    Insert order_rows_;
-    Insert deliveries_;
-    Insert delivery_rows_;
-    Insert invoices_;
-    Insert invoice_rows_;
-    Random keys_{4};
+    Kind orders_;
+    Kind deliveries_;
+    Kind invoices_;
+    Random random_{4};
     std::int64_t last_document_ = 0;
-    std::int64_t last_order_ = 100'000;
-    std::int64_t last_delivery_ = 200'000;
-    std::int64_t last_invoice_ = 260'000;
-    std::int64_t last_order_row_ = 0;
-    std::int64_t last_delivery_row_ = 0;
 };
 
 }  // namespace zebtell::demo

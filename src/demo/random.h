@@ -6,7 +6,8 @@
 namespace zebtell::demo {
 
 // A small random generator of its own (SplitMix64), since those of the standard library's
-// distributions differ from one library to another and the demo data must not.
+// distributions differ from one library to another and the demo data must not. For the same
+// reason no expression draws two numbers, unless their order is certain.
 class Random {
   public:
     explicit Random(std::uint64_t seed) : state_(seed) {}
