@@ -28,8 +28,10 @@ std::optional<SessionStore::Created> SessionStore::Create() {
     auto queue = std::make_shared<SerialQueue>(pool_, options_.queue_limit);
     const std::lock_guard lock(mutex_);
     if (by_key_.size() >= options_.max_sessions) {
-        if (anonymous_.empty()) return std::nullopt;
-        created.evicted = Remove(anonymous_.begin());
+        const bool has_expired = !logged_on_.empty() && IsExpired(logged_on_.front());
+        Entries& from = ListOf(has_expired);
+        if (from.empty()) return std::nullopt;
+        created.evicted = Remove(from.begin());
     }
     created.session = std::make_shared<Session>(std::to_string(next_number_++), std::move(queue));
     created.session->key_ = TokenKey::Of(created.token);
