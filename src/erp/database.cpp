@@ -15,6 +15,8 @@ std::unique_ptr<Backend> MakeBackend(data::DatabaseType type, const std::string&
     throw base::RuntimeError(base::errors::kUnspecified, "This kind of database is not supported");
 }
 
+Databases::Databases(base::Clock clock) : Databases(std::move(clock), MakeBackend) {}
+
 Databases::Databases(base::Clock clock, BackendFactory make_backend)
     : clock_(std::move(clock)), make_backend_(std::move(make_backend)) {}
 

@@ -25,7 +25,8 @@ std::unique_ptr<Backend> MakeBackend(data::DatabaseType type, const std::string&
 // connection pools, schemas and lists. Thread-safe; outlives every application made from it.
 class Databases {
   public:
-    explicit Databases(base::Clock clock, BackendFactory make_backend = MakeBackend);
+    explicit Databases(base::Clock clock);
+    Databases(base::Clock clock, BackendFactory make_backend);
     ~Databases();
 
     std::unique_ptr<data::DataApplication> NewApplication();

@@ -8,7 +8,8 @@ namespace {
 std::string Joined(const std::vector<std::int64_t>& ids) {
     std::string text;
     for (const std::int64_t id : ids) {
-        text += (text.empty() ? "" : ",") + std::to_string(id);
+        text += text.empty() ? "" : ",";
+        text += std::to_string(id);
     }
     return text.empty() ? "0" : text;
 }
