@@ -1,25 +1,6 @@
 #include "erp/schema.h"
 
 namespace zebtell::erp {
-namespace {
-
-using ColumnsByName =
-    std::unordered_map<std::string, std::string, base::NoCaseHash, base::NoCaseEqual>;
-
-ColumnsByName TargetsOf(const std::vector<TableInfo>& tables) {
-    ColumnsByName targets;
-    for (const TableInfo& table : tables) {
-        for (const Column& column : table.columns) {
-            if (!column.links_to.empty() && !base::EqualNoCase(column.name, "ID")) {
-                targets.emplace(column.name, column.links_to);
-            }
-        }
-    }
-    return targets;
-}
-
-}  // namespace
-
 const Column* TableInfo::FindColumn(std::string_view column) const {
     for (const Column& known : columns) {
         if (known.name.size() == column.size() && base::EqualNoCase(known.name, column)) {
@@ -40,23 +21,9 @@ const Column* TableInfo::FindLink(std::string_view link) const {
     return nullptr;
 }
 
-// Views have no foreign keys: their link columns lead where the same names lead elsewhere.
 Schema::Schema(std::vector<TableInfo> tables) : tables_(std::move(tables)) {
     for (std::size_t i = 0; i < tables_.size(); ++i) {
         by_name_.emplace(tables_[i].name, i);
-    }
-    const ColumnsByName targets = TargetsOf(tables_);
-    for (TableInfo& table : tables_) {
-        for (Column& column : table.columns) {
-            if (!column.links_to.empty() || !base::StartsWithNoCase(column.name, "ID")) {
-                continue;
-            }
-            if (const TableInfo* named = Find(std::string_view(column.name).substr(2))) {
-                column.links_to = named->name;
-            } else if (const auto known = targets.find(column.name); known != targets.end()) {
-                column.links_to = known->second;
-            }
-        }
     }
 }
 

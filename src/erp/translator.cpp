@@ -2,6 +2,7 @@
 
 #include "base/text.h"
 #include "erp/sql/errors.h"
+#include "erp/sql/narrow.h"
 #include "erp/sql/parser.h"
 #include "erp/sql/print.h"
 
@@ -149,6 +150,7 @@ BoundSql Translator::RowsByID(const Reader& reader,
 
 BoundSql Translator::Select(const Reader& reader, std::string_view sql) const {
     const sql::SelectPtr select = sql::Parser(sql, Style::kStatement).ParseStatement();
+    sql::NarrowSubqueries(*select);
     Context context(schema_, dialect_, reader, Style::kStatement);
     BoundSql out;
     sql::PrintSelect(context, *select, nullptr, sql::SelectUse::kResult, out);

@@ -33,6 +33,10 @@ Lexer::Lexer(std::string_view text, Style style) : text_(text), style_(style) {
     if (text.size() > kLongestText) {
         Fail("The condition or statement is too long");
     }
+    // A byte that begins a character without its rest could swallow a quote on the way.
+    if (!base::IsValidUtf8(text)) {
+        Fail("The condition or statement is no valid text");
+    }
     Advance();
 }
 
