@@ -24,8 +24,9 @@ Digits DigitsOf(const Decimal& number, int fraction_places) {
     if (number.scale > 0) {
         const auto scale = static_cast<std::size_t>(number.scale);
         if (digits.whole.size() < scale) digits.whole.insert(0, scale - digits.whole.size(), '0');
-        digits.fraction = digits.whole.substr(digits.whole.size() - scale);
-        digits.whole.resize(digits.whole.size() - scale);
+        const std::size_t mark = digits.whole.size() - scale;
+        digits.fraction = digits.whole.substr(mark);
+        digits.whole.erase(mark);
     } else if (!digits.whole.empty()) {
         digits.whole.append(-number.scale, '0');
     }

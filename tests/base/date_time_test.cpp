@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <cmath>
+
 #include "base/date_text.h"
 #include "base/runtime_error.h"
 
