@@ -44,10 +44,10 @@ constexpr ArticleKind kKinds[] = {
     {"LIH", "Lihvmaterjalid", "Tööriist", "tk", 10, 45, 3400, kConsumables, kStandard,
      "Lihvpaber|Lihvlint|Lihvkäsn|Lihvvõrk|Velcro-lihvketas|Poleervilt",
      "75|100|115|125|150|200", "280|533|610|1000|2000", "P40|P60|P80|P120|P180|P240|P400"},
-    {"ELK", "Elektroodid", "Keevitus", "pk", 1, 690, 9800, kConsumables, kStandard,
+    {"ELK", "Elektroodid", "Keevitus", "kg", 5, 690, 9800, kConsumables, kStandard,
      "Elektrood E7018|Elektrood E6013 rutiil|Elektrood roostevaba 316L|"
      "Elektrood malmile Ni|Elektrood pealesulatuseks|Elektrods E6013",
-     "2,0|2,5|3,2|4,0|5,0", "300|350|450", "1 kg|2,5 kg|5 kg|< 60 HRC|vaakumpakk"},
+     "2,0|2,5|3,2|4,0|5,0", "300|350|450", "vaakumpakk|karbis|AC/DC|< 60 HRC|torus"},
     {"KEE", "Keevitustarvikud", "Keevitus", "tk", 1, 120, 24900, kConsumables, kStandard,
      "Keevitustraat G3Si1|Keevitustraat 308LSi|Kontaktsuudmik % M6|Gaasidüüs|"
      "TIG-varras ER70S-6|Volframelektrood WL20|Massiklamber|Keevitaja O'Shield mask",

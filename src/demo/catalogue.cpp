@@ -109,7 +109,7 @@ Article CatalogueWriter::WriteArticle(int id) {
     article.id = id;
     article.tax_percent = PercentOfTax(kind.tax);
     article.price_group = kind.price_group;
-    article.is_measured = kind.unit == "m" || kind.unit == "l";
+    article.is_measured = kind.unit == "m" || kind.unit == "kg" || kind.unit == "l";
     articles_.Row(id,
                   name.code,
                   name.name,

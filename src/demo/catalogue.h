@@ -26,7 +26,7 @@ struct Article {
     std::int64_t id = 0;
     double tax_percent = 0;
     PriceGroup price_group = PriceGroup::kNet;
-    bool is_measured = false;  // sold in metres, kilograms or litres, so in halves too
+    bool is_measured = false;  // by metre, kilogram or litre, so halves too
     // The price in each list with lines of its own, by list ID - 1; 0 when it has none there.
     std::array<base::Currency, kOwnLineLists> prices;
 
