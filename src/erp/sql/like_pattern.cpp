@@ -6,11 +6,12 @@ std::string LikePattern(std::string_view pattern, Style style, Dialect dialect) 
     const bool filter = style == Style::kFilter;
     std::string result;
     result.reserve(pattern.size() + 2);
+    char before = '\0';
     for (const char c : pattern) {
+        const bool repeated = c == before;
+        before = c;
         if (filter && c == '*') {
-            if (result.empty() || result.back() != '%') {
-                result += '%';
-            }
+            result += repeated ? "" : "%";
             continue;
         }
         if (filter && c == '?') {
