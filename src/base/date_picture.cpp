@@ -82,8 +82,12 @@ constexpr Letter kLetters[] = {
      {nullptr, nullptr, nullptr, nullptr, [](W w) { AppendLongTime(w.out, w.time, w.region); }}},
 };
 
+char LowerByte(char c) {
+    return static_cast<char>(c >= 'A' && c <= 'Z' ? c - 'A' + 'a' : c);
+}
+
 const Letter* FindLetter(char c) {
-    const char lower = static_cast<char>(c >= 'A' && c <= 'Z' ? c - 'A' + 'a' : c);
+    const char lower = LowerByte(c);
     for (const Letter& letter : kLetters) {
         if (letter.letter == lower) return &letter;
     }
@@ -116,7 +120,8 @@ bool HasHalfOfDay(std::string_view picture, const Region& region) {
 // How often the first character stands at the start of the text, at most six times.
 std::size_t RunLength(std::string_view text, const Letter& letter) {
     std::size_t size = 1;
-    while (size < letter.fields.size() && size < text.size() && FindLetter(text[size]) == &letter) {
+    while (size < letter.fields.size() && size < text.size() &&
+           LowerByte(text[size]) == letter.letter) {
         ++size;
     }
     return size;

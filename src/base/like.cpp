@@ -73,12 +73,16 @@ std::size_t ListEnd(std::string_view pattern, std::size_t open) {
     return end;
 }
 
+bool IsSpecial(char c) {
+    return c == '*' || c == '?' || c == '#' || c == '[';
+}
+
 // Before the match, so that a wrong pattern is an error with every text. True when the pattern
 // holds nothing but itself.
 bool CheckIsPlain(std::string_view pattern) {
     bool plain = true;
-    for (std::size_t at = pattern.find_first_of("*?#["); at != kNowhere;
-         at = pattern.find_first_of("*?#[", at + 1)) {
+    for (std::size_t at = 0; at < pattern.size(); ++at) {
+        if (!IsSpecial(pattern[at])) continue;
         plain = false;
         if (pattern[at] != '[') continue;
         const std::size_t end = ListEnd(pattern, at);

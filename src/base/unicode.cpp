@@ -61,9 +61,8 @@ CodePoint LoneByte(unsigned char byte) {
 
 }  // namespace
 
-CodePoint DecodeAt(std::string_view text, std::size_t at) {
+CodePoint DecodeBeyondAscii(std::string_view text, std::size_t at) {
     const auto lead = static_cast<unsigned char>(text[at]);
-    if (lead < 0x80) return {lead, 1};
     std::size_t size = 0;
     char32_t least = 0;
     char32_t value = 0;
@@ -85,7 +84,7 @@ CodePoint DecodeAt(std::string_view text, std::size_t at) {
     return {value, size};
 }
 
-char32_t LowerLetter(char32_t letter) {
+char32_t LowerBeyondAscii(char32_t letter) {
     if (letter < kTableEnd) return kLower[letter];
     for (const CaseRange& range : kAdditional) {
         if (letter >= range.first && letter <= range.last) return letter | 1U;

@@ -2,6 +2,7 @@
 
 #include <charconv>
 #include <cmath>
+#include <optional>
 
 #include "base/date_text.h"
 #include "base/decimal.h"
@@ -24,11 +25,20 @@ Overloaded(Cases...) -> Overloaded<Cases...>;
     throw RuntimeError(errors::kTypeMismatch);
 }
 
+// The same number as an amount, when its shortest digits are at most 15 with at most 4 decimals:
+// amounts are written several times faster.
+std::optional<Currency> ShortAmount(double number) {
+    constexpr std::int64_t kEnd = 1'000'000'000'000'000;
+    const Decimal decimal = Decimal::FromDouble(number);
+    if (decimal.scale != Currency::kDecimals || decimal.mantissa >= kEnd) return std::nullopt;
+    const auto digits = static_cast<std::int64_t>(decimal.mantissa);
+    return Currency::FromScaled(decimal.negative ? -digits : digits);
+}
+
 // As people read numbers: at most 15 digits, "1E+20" from there on.
 std::string GeneralNumber(double number, char decimal_mark) {
     constexpr int kDigits = 15;
-    if (!std::isfinite(number)) throw RuntimeError(errors::kOverflow);
-    if (number == 0) return "0";
+    if (const auto amount = ShortAmount(number)) return amount->ToText(decimal_mark);
     char buffer[40];
     const auto end =
         std::to_chars(buffer, buffer + sizeof buffer, number, std::chars_format::general, kDigits)
