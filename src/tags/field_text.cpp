@@ -14,14 +14,11 @@ void WriteField(TagCall& call, data::Record* record, std::span<const std::string
         return base::EqualNoCase(name, reference);
     });
     if (is_fixed) reference += ";fixed";
-    const auto settings = call.state.settings();
-    call.tag.Write(FormatFieldValue(*record, reference, "", settings->region()));
+    WriteField(call, record, reference);
 }
 
 void WritePlainField(TagCall& call, data::Record& record, std::string_view field) {
-    const auto settings = call.state.settings();
-    const base::Value value = record.GetField(field);
-    call.tag.WriteEscaped(value.IsBlank() ? "" : value.ToText(settings->region()));
+    call.tag.WriteEscaped(RawText(record, field, RegionOf(call.state)));
 }
 
 }  // namespace zebtell::tags

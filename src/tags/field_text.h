@@ -5,14 +5,10 @@
 #include <string_view>
 
 #include "tags/custom_func.h"
+#include "tags/field_output.h"
 #include "tags/tag_table.h"
 
 namespace zebtell::tags {
-
-// What the tag's contents name, cleaned.
-inline std::string Reference(const TagCall& call) {
-    return CleanFormValue(call.tag.TagContents());
-}
 
 // Writes the field of `record` that the contents name, formatted; fields of `fixed` with two
 // decimals. "&nbsp;" when there is no record.

@@ -80,7 +80,8 @@ std::string FormatFieldValue(data::Record& record,
 
 std::string FieldHtml(std::string text) {
     if (text.empty()) return std::string(kNothing);
-    if (text.find_first_of("<>") == npos) return text;
+    // Two searches by byte are several times faster than one for either.
+    if (text.find('<') == npos && text.find('>') == npos) return text;
     return base::Replaced(base::Replaced(text, "<", "&lt;"), ">", "&gt;");
 }
 

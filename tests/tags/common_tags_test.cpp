@@ -58,16 +58,12 @@ TEST(CommonTags, ShowHideAndSettings) {
         {"blocked", nothing, "ZEB:Orders.Blocked", "x", {"x", 1}},
         {"nothing saved yet", nothing, "ZEB:SaveValue", "save_a", {"", 1}},
         {"saved",
-         [](Session& s) {
-             s.state.templates.SavedValues.emplace()["save_a"] = "<b>\"1\"";
-         },
+         [](Session& s) { s.state.templates.SavedValues.emplace()["save_a"] = "<b>\"1\""; },
          "ZEB:SaveValue",
          " SAVE_A ",
          {"&lt;b&gt;&quot;1&quot;", 1}},
         {"another key saved",
-         [](Session& s) {
-             s.state.templates.SavedValues.emplace()["save_a"] = "1";
-         },
+         [](Session& s) { s.state.templates.SavedValues.emplace()["save_a"] = "1"; },
          "ZEB:SaveValue",
          "save_b",
          {"", 1}},
