@@ -1,5 +1,7 @@
 #include "erp/translator.h"
 
+#include <utility>
+
 #include "base/text.h"
 #include "erp/sql/errors.h"
 #include "erp/sql/narrow.h"
