@@ -257,6 +257,7 @@ CREATE INDEX DDStoreDRow_Document ON DDStoreDRow(IDSDConsignmD);
 CREATE INDEX DDStoreDRow_OrderRow ON DDStoreDRow(IDSDOrderRow);
 CREATE INDEX DDStoreDRow_Article ON DDStoreDRow(IDGRArticle);
 
+-- State of an invoice: 1 open, 2 paid.
 CREATE TABLE SDInvoice (
     ID INTEGER PRIMARY KEY REFERENCES GDocument(ID),
     Number INTEGER NOT NULL UNIQUE,

@@ -22,8 +22,8 @@ enum class CompanyGroup { kRetail = 1, kUsual, kRegular, kGold };
 struct CompanyRow {
     std::string_view name;
     int town;  // position in Towns()
-    std::int64_t price_list;
     CompanyGroup group;
+    std::int64_t price_list;
     double price_cut = 0;
     std::int64_t parent = 0;  // who also pays its invoices
 };

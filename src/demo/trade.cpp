@@ -74,20 +74,20 @@ void Trade::Run() {
     const std::int64_t days = last_workday_ - first_day_;
     for (int day = first_day_; day <= today_; ++day) {
         if (IsWorkday(day)) {
-            TakeOrders(day, static_cast<int>(wanted_rows_ * (day - first_day_) / days));
+            TakeOrders(day, (day - first_day_) * wanted_rows_ / days);
         }
         Deliver(day);
         Bill(day);
     }
 }
 
-void Trade::TakeOrders(int day, int rows_until_then) {
+void Trade::TakeOrders(int day, std::int64_t rows_until_then) {
     const base::DateTime date(day);
     const bool with_blocked = day < (first_day_ + today_) / 2;
     // On the last day those whom people log on as have something to look at.
     std::size_t next = 0;
     while (rows_ < rows_until_then) {
-        const int rows_left = wanted_rows_ - rows_;
+        const int rows_left = static_cast<int>(wanted_rows_ - rows_);
         const bool is_known = day == last_workday_ && next < kJanisCompany;
         TradeDocument order = is_known ? orders_.MakeFor(next, date, rows_left)
                                        : orders_.Make(date, rows_left, with_blocked);

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstdint>
 #include <map>
 #include <vector>
 
@@ -28,7 +29,7 @@ class Trade {
   private:
     using Calendar = std::map<int, std::vector<TradeDocument>>;  // by day
 
-    void TakeOrders(int day, int rows_until_then);
+    void TakeOrders(int day, std::int64_t rows_until_then);
     void StoreOrder(TradeDocument order);
     void PlanDelivery(const TradeDocument& order, int day, const std::vector<double>& quantities);
     void Deliver(int day);
@@ -39,8 +40,8 @@ class Trade {
     int first_day_;
     int today_;
     int last_workday_;
-    int wanted_rows_;
-    int rows_ = 0;
+    std::int64_t wanted_rows_;
+    std::int64_t rows_ = 0;
     OrderMaker orders_;
     DocumentWriter writer_;
     Random random_{5};
