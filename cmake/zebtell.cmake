@@ -15,10 +15,13 @@ add_library(zebtell_std OBJECT ${CMAKE_CURRENT_LIST_DIR}/std.cpp)
 target_precompile_headers(zebtell_std PRIVATE ${CMAKE_CURRENT_LIST_DIR}/std.h)
 
 # zebtell_library(folder DEPENDS layer... LINK target...) makes the layer src/<folder> of all its
-# files, sub-folders included. DEPENDS names the layers that it may include.
+# files but EXCEPT, sub-folders included. DEPENDS names the layers that it may include.
 function(zebtell_library name)
-    cmake_parse_arguments(ARG "" "" "DEPENDS;LINK" ${ARGN})
+    cmake_parse_arguments(ARG "" "EXCEPT" "DEPENDS;LINK" ${ARGN})
     file(GLOB_RECURSE sources CONFIGURE_DEPENDS ${PROJECT_SOURCE_DIR}/src/${name}/*.cpp)
+    if(ARG_EXCEPT)
+        list(REMOVE_ITEM sources ${PROJECT_SOURCE_DIR}/src/${name}/${ARG_EXCEPT})
+    endif()
     list(TRANSFORM ARG_DEPENDS PREPEND zebtell_)
     if(sources)
         add_library(zebtell_${name} STATIC ${sources})

@@ -30,7 +30,7 @@ struct Page {
     void (*ProcessTag)(State&, Call&, markup::Tag&) = nullptr;
     // For event names made at run time. Null: such events show the page's template.
     void (*UserEvent)(State&, Call&, std::string_view event) = nullptr;
-    std::vector<PageEvent<State>> events = {};
+    std::vector<PageEvent<State>> events;
 };
 
 // What the runtime raises on the application around the pages.

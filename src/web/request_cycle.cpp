@@ -69,7 +69,12 @@ class Cycle {
         }
     }
 
+    // Behind a post the browser is sent on, so that reload and back do not post again.
     void FollowNextItems() {
+        if (call_.HasNextItem() && call_.request.method == "POST") {
+            response_.Redirect(UrlFor(call_.TakeNextItem(), {}));
+            return;
+        }
         for (int hops = 0; call_.HasNextItem(); ++hops) {
             if (hops == kMaxNextItems)
                 throw base::RuntimeError(base::errors::kInvalidCall, "Too many next items");
