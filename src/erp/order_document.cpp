@@ -133,6 +133,7 @@ std::shared_ptr<data::RecordList> OrderDocument::Rows() {
 }
 
 void OrderDocument::Save() {
+    const std::lock_guard lock(saving_);
     SaveOrder(*order_);
 }
 

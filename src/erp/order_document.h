@@ -1,6 +1,7 @@
 #pragma once
 
 #include <memory>
+#include <mutex>
 
 #include "data/document.h"
 #include "erp/order.h"
@@ -20,6 +21,7 @@ class OrderDocument : public data::Document {
 
   private:
     std::shared_ptr<Order> order_;
+    std::mutex saving_;  // an impatient second submit waits for the first and finds it stored
 };
 
 }  // namespace zebtell::erp

@@ -19,8 +19,8 @@ class UserAdmin {
     struct NewUser {
         std::string name;
         std::string password;
-        std::string display_name;
-        std::string partner_code;  // GRCompany.Code; empty: no partner
+        std::string display_name = {};
+        std::string partner_code = {};  // GRCompany.Code; empty: no partner
         bool guest = false;
     };
     void Add(const NewUser& user);
