@@ -37,7 +37,7 @@ fs::path FindFile(const fs::path& folder, std::string_view name) {
     std::error_code error;
     const fs::path root = fs::canonical(folder, error);
     if (error) FailNotFound(name);
-    const fs::path file = fs::canonical(root / relative, error);
+    fs::path file = fs::canonical(root / relative, error);
     if (error || !IsWithin(root, file) || !fs::is_regular_file(file, error)) FailNotFound(name);
     return file;
 }

@@ -42,7 +42,7 @@ std::optional<std::string> TakeQuoted(std::string_view& text) {
 
 std::string TakeToken(std::string_view& text) {
     const std::size_t end = std::min(text.find(';'), text.size());
-    const std::string value(base::Trimmed(text.substr(0, end)));
+    std::string value(base::Trimmed(text.substr(0, end)));
     text.remove_prefix(end);
     return value;
 }

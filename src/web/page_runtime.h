@@ -94,8 +94,8 @@ class PageRuntime : public SiteRuntime {
                       std::move(options)) {}
 
     // An http::Handler: `[&runtime](auto request, auto respond) { runtime(...); }`.
-    void operator()(http::Request request, http::Responder respond) {
-        Handle(std::move(request), std::move(respond));
+    void operator()(const http::Request& request, http::Responder respond) {
+        Handle(request, std::move(respond));
     }
 };
 

@@ -57,7 +57,7 @@ void SiteRuntime::Stop() {
     sessions_.TakeAll();
 }
 
-void SiteRuntime::Handle(http::Request request, http::Responder respond) {
+void SiteRuntime::Handle(const http::Request& request, http::Responder respond) {
     if (options_.static_files) {
         if (auto response = options_.static_files(request)) return respond(std::move(*response));
     }

@@ -42,7 +42,7 @@ class SiteRuntime {
     SiteRuntime(const SiteRuntime&) = delete;
     SiteRuntime& operator=(const SiteRuntime&) = delete;
 
-    void Handle(http::Request request, http::Responder respond);
+    void Handle(const http::Request& request, http::Responder respond);
 
     // Finishes the requests that wait and ends all sessions' instances. Handle must not be called
     // any more: stop the server first.
