@@ -72,8 +72,8 @@ export class Visitor {
     await Promise.all(this.checks);
   }
 
-  // Does what leads to another page, and waits for that and for its check: a browser forgets what it
-  // was sent when it goes on.
+  // Does what leads to another page, and waits for that and for its check: a browser forgets what
+  // it was sent when it goes on.
   async arrive(action) {
     await Promise.all([this.page.waitForEvent('domcontentloaded'), action()]);
     await Promise.all(this.checks);
@@ -143,7 +143,8 @@ export class Visitor {
 
   // The value beside a label in a list of sums or data.
   async value(label) {
-    const line = this.page.locator('dl > div', { has: this.page.getByText(label, { exact: true }) });
+    const term = this.page.getByText(label, { exact: true });
+    const line = this.page.locator('dl > div', { has: term });
     return (await line.locator('dd').innerText()).trim();
   }
 
@@ -153,7 +154,7 @@ export class Visitor {
     await this.press('Lisa korvi');
   }
 
-  // Takes the page in three widths; each must fit without sideways scrolling, as a narrow phone must.
+  // Takes the page in three widths; it must fit them, and a narrow phone, without sideways scrolling.
   async photograph(name) {
     mkdirSync(screenshots, { recursive: true });
     for (const width of [320, 390, 820, 1366]) {
@@ -184,7 +185,8 @@ async function checkResponse(response) {
   const type = response.headers()['content-type'] ?? '';
   if (response.status() >= 300 || !type.startsWith('text/html')) return [];
   const text = await response.text();
-  const problems = [...text.matchAll(/<\/?zeb:[^>]*>/gi)].map((tag) => `${url}: ${tag[0]} was sent`);
+  const tags = [...text.matchAll(/<\/?zeb:[^>]*>/gi)];
+  const problems = tags.map((tag) => `${url}: ${tag[0]} was sent`);
   const report = await validator.validateString(withOptionEnds(text));
   for (const { messages } of report.results) {
     problems.push(...messages.map((m) => `${url}:${m.line}: ${m.message} (${m.ruleId})`));
