@@ -81,11 +81,13 @@ const StatementRow kStatements[] = {
      "A condition stands where a value is needed"},
     {"select year(DocDate), month(DocDate), day(DocDate), dateadd(day, 2*2, DocDate), "
      "dateadd(month, -1, DocDate), dateadd(year, 1, #02/28/2027#), datediff(day, DocDate, "
-     "WantedDate), datediff(year, DocDate, #01/01/2030#) from SDOrder where ID=100 and "
+     "WantedDate), datediff(year, DocDate, #01/01/2030#), "
+     "datediff(month, #12/31/1999#, DocDate), datediff(month, DocDate, #11/01/2026#) from SDOrder "
+     "where ID=100 and "
      "getdate()>DocDate-1",
      nullptr,
      nullptr,
-     "2026|11|20|2026-11-24|2026-10-20|2028-02-28|5|4"},
+     "2026|11|20|2026-11-24|2026-10-20|2028-02-28|5|4|323|0"},
     {"select a.Name, a.GRTax.TaxPercent p from GRArticle a where GRTax.Name='Half' order by p, "
      "a.Name desc",
      "select t1.Name as Name, t2.TaxPercent as p from GRArticle t1 left join GRTax t2 on t2.ID = "

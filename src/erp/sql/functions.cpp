@@ -43,6 +43,8 @@ constexpr Function kFunctions[] = {
     {"dateadd month",     2, 2, kDate,    false, "replace(datetime($2, ($1) || ' months'), ' 00:00:00', '')", "dateadd(month, $1, $2)"},
     {"dateadd year",      2, 2, kDate,    false, "replace(datetime($2, ($1) || ' years'), ' 00:00:00', '')",  "dateadd(year, $1, $2)"},
     {"datediff day",      2, 2, kNumber,  false, "cast(julianday(date($2)) - julianday(date($1)) as integer)", "datediff(day, $1, $2)"},
+    // From one first of a month to another, so that the mean month divides them well enough.
+    {"datediff month",    2, 2, kNumber,  false, "cast(round((julianday(date($2, 'start of month')) - julianday(date($1, 'start of month'))) / 30.436875) as integer)", "datediff(month, $1, $2)"},
     {"datediff year",     2, 2, kNumber,  false, "(strftime('%Y', $2) - strftime('%Y', $1))",               "datediff(year, $1, $2)"},
 };
 
