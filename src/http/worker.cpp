@@ -61,6 +61,8 @@ void Worker::ScheduleSweep(Clock::duration wait) {
 }
 
 void Worker::Sweep() {
+    // Cancelling comes too late for a timer that was due at the same time as the last close.
+    if (!work_.owns_work()) return;
     const auto now = Clock::now();
     const bool is_over = stopping_ && now >= stop_deadline_;
     // They leave the set while they are being looked after.

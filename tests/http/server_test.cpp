@@ -269,6 +269,39 @@ TEST(Stop, EndsInTimeWhateverClientsDo) {
     EXPECT_LT(std::chrono::steady_clock::now() - begin, seconds(1));
 }
 
+// The last connection's end and the timer that watches the stop fall together: the IO thread is
+// held up, by freeing a response, until both are due.
+TEST(Stop, EndsWhenItsTimerIsDueWithTheLastClose) {
+    Held held;
+    ServerOptions options = TwoThreads();
+    options.io_threads = 1;
+    TestServer test(held.handler(), std::move(options));
+    RawClient last = test.Connect();
+    last.Send(Get("/") + "GET / HT");
+    held.Take()(Text("its next request has begun"));
+    last.Read();
+    RawClient first = test.Connect();
+    first.Send(Get("/"));
+    const Responder respond = held.Take();
+    auto stopped = std::async(std::launch::async, [&] { test.server.Stop(); });
+    std::this_thread::sleep_for(milliseconds(20));
+    std::promise<void> freeing;
+    Response response;
+    response.shared_body = std::shared_ptr<const std::string>(
+        std::make_unique<const std::string>(16 * 1024 * 1024, 'x').release(),
+        [&freeing](const std::string* body) {
+            const std::unique_ptr<const std::string> freed(body);
+            freeing.set_value();
+            std::this_thread::sleep_for(milliseconds(50));
+        });
+    respond(std::move(response));
+    std::this_thread::sleep_for(milliseconds(20));
+    first.Close();
+    freeing.get_future().wait();
+    last.Close();
+    EXPECT_EQ(stopped.wait_for(seconds(2)), std::future_status::ready);
+}
+
 TEST(Server, StartsAgainAndTellsWhatItCannotUse) {
     TestServer test;
     test.server.Stop();
