@@ -1,5 +1,6 @@
 #pragma once
 
+#include <atomic>
 #include <chrono>
 #include <condition_variable>
 #include <cstdint>
@@ -45,7 +46,8 @@ class ConnectionPool {
     // that takes too long.
     Lease Write();
 
-    // Grows whenever anybody, in this process or another, has committed something.
+    // Grows whenever something has been committed: at once for what a Lease of this pool has
+    // written, within a millisecond for what others have.
     std::int64_t DataVersion();
 
   private:
@@ -63,7 +65,11 @@ class ConnectionPool {
     std::mutex watch_mutex_;
     std::unique_ptr<Connection> watcher_;
     std::int64_t watched_ = 0;
-    std::int64_t version_ = 0;
+    std::atomic<std::int64_t> version_ = 0;
+    std::atomic<std::chrono::steady_clock::time_point> looked_{};
+    // How often the writer came back, now and at the last look.
+    std::atomic<std::int64_t> writes_ = 0;
+    std::atomic<std::int64_t> looked_writes_ = 0;
 };
 
 }  // namespace zebtell::erp

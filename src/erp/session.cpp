@@ -1,5 +1,7 @@
 #include "erp/session.h"
 
+#include <algorithm>
+
 #include "base/runtime_error.h"
 
 namespace zebtell::erp {
@@ -34,26 +36,58 @@ std::span<const std::string> Selected(const FieldSet& fields) {
     return std::span(fields.names()).subspan(1);
 }
 
+std::string KeyOf(const Reader& reader) {
+    std::string key = reader.role == Role::kGuest ? "guest" : "user";
+    const auto add = [&key](std::int64_t value) { key += " " + std::to_string(value); };
+    for (const std::int64_t value : {reader.user,
+                                     reader.partner,
+                                     reader.settlement_company,
+                                     reader.parent,
+                                     reader.employee,
+                                     reader.contact,
+                                     reader.price_category}) {
+        add(value);
+    }
+    std::for_each(reader.price_lists.begin(), reader.price_lists.end(), add);
+    key += ",";
+    std::for_each(reader.saved_documents.begin(), reader.saved_documents.end(), add);
+    return key;
+}
+
 }  // namespace
 
-// The result of an equal statement since the database changed last, else what `read` makes of it.
-template <class Read>
-auto Session::Shared(char kind, const BoundSql& sql, Read&& read) {
-    const std::string key = ResultKey(kind, sql);
+Session::Session(std::shared_ptr<CompanyDatabase> database, Reader reader, base::Clock clock)
+    : database_(std::move(database)),
+      reader_(std::move(reader)),
+      clock_(std::move(clock)),
+      reader_key_(KeyOf(reader_)) {}
+
+void Session::AddSavedDocument(std::int64_t id) {
+    reader_.saved_documents.push_back(id);
+    reader_key_ = KeyOf(reader_);
+}
+
+// The result of that key since the database changed last, else what `read` gives.
+template <class Kept, class Read>
+std::shared_ptr<const Kept> Session::Shared(const std::string& key, Read&& read) {
     const std::int64_t version = database_->pool().DataVersion();
-    using Kept = decltype(read(std::declval<Cursor&>()));
     if (auto kept = database_->results().Find(key, version)) {
-        return std::static_pointer_cast<typename Kept::element_type>(kept);
+        return std::static_pointer_cast<const Kept>(std::move(kept));
     }
-    const Lease connection = database_->pool().Read();
-    const auto cursor = connection->Query(sql);
-    Kept result = read(*cursor);
+    std::shared_ptr<const Kept> result = read();
     database_->results().Keep(key, version, result);
     return result;
 }
 
+template <class Read>
+auto Session::Run(const BoundSql& sql, Read&& read) {
+    const Lease connection = database_->pool().Read();
+    const auto cursor = connection->Query(sql);
+    return read(*cursor);
+}
+
 // Named users and guests may read different columns.
-std::string Session::ReaderKey(const TableInfo& table) const {
+std::string Session::TableKey(const TableInfo& table) const {
     return (reader_.role == Role::kGuest ? "guest " : "user ") + table.name;
 }
 
@@ -62,14 +96,15 @@ std::shared_ptr<const KeyTable> Session::Keys(const TableInfo& table,
                                               std::string_view order,
                                               std::string_view find_column) {
     LearnedFields& learned = database_->find_columns();
-    const std::string key = ReaderKey(table);
+    const std::string key = TableKey(table);
     const auto known = learned.Of(key, [] { return std::vector<std::string>(); });
     const auto fields = With(known, find_column);
     const std::vector<std::string> columns(Selected(*fields).begin(), Selected(*fields).end());
     const BoundSql sql =
         database_->translator().ListKeys(reader_, table.name, filter, order, columns);
-    auto keys = Shared('k', sql, [&](Cursor& cursor) {
-        return std::make_shared<const KeyTable>(cursor, columns);
+    auto keys = Shared<KeyTable>(ResultKey('k', sql), [&] {
+        return Run(
+            sql, [&](Cursor& cursor) { return std::make_shared<const KeyTable>(cursor, columns); });
     });
     if (fields != known) {
         learned.Learn(key, fields);
@@ -81,24 +116,28 @@ std::shared_ptr<const RowSet> Session::Rows(const TableInfo& table,
                                             std::span<const std::int64_t> ids,
                                             std::string_view field) {
     LearnedFields& learned = database_->fields();
-    const std::string key = ReaderKey(table);
+    const std::string key = TableKey(table);
     const auto known = learned.Of(
         key, [&] { return database_->translator().ReadableColumns(reader_, table.name); });
     const auto fields = With(known, field);
     const BoundSql sql =
         database_->translator().RowsByID(reader_, table.name, ids, Selected(*fields));
-    auto rows = Shared(
-        'r', sql, [&](Cursor& cursor) { return RowSet::Arranged(*ReadAll(cursor, fields), ids); });
+    auto rows = Shared<RowSet>(ResultKey('r', sql), [&] {
+        return Run(sql,
+                   [&](Cursor& cursor) { return RowSet::Arranged(*ReadAll(cursor, fields), ids); });
+    });
     if (fields != known) {
         learned.Learn(key, fields);
     }
     return rows;
 }
 
+// Known by its text as it was written, since taking that apart costs more than an unchanged page.
 std::shared_ptr<const RowSet> Session::Query(std::string_view sql) {
-    const BoundSql bound = database_->translator().Select(reader_, sql);
-    return Shared('q', bound, [](Cursor& cursor) -> std::shared_ptr<const RowSet> {
-        return ReadAll(cursor, std::make_shared<const FieldSet>(cursor.Columns()));
+    return Shared<RowSet>("q" + reader_key_ + "\n" + std::string(sql), [&] {
+        return Run(database_->translator().Select(reader_, sql), [](Cursor& cursor) {
+            return ReadAll(cursor, std::make_shared<const FieldSet>(cursor.Columns()));
+        });
     });
 }
 

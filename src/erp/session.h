@@ -19,8 +19,7 @@ namespace zebtell::erp {
 // reads through. Used by one thread at a time.
 class Session {
   public:
-    Session(std::shared_ptr<CompanyDatabase> database, Reader reader, base::Clock clock)
-        : database_(std::move(database)), reader_(std::move(reader)), clock_(std::move(clock)) {}
+    Session(std::shared_ptr<CompanyDatabase> database, Reader reader, base::Clock clock);
 
     CompanyDatabase& database() const { return *database_; }
     const Schema& schema() const { return database_->schema(); }
@@ -28,7 +27,7 @@ class Session {
     const base::Clock& clock() const { return clock_; }
 
     // From now on the reader sees this document, which he has just stored.
-    void AddSavedDocument(std::int64_t id) { reader_.saved_documents.push_back(id); }
+    void AddSavedDocument(std::int64_t id);
 
     // The keys of a table's rows, with the columns that its records were looked up by so far and
     // `find_column` ("": no other).
@@ -47,13 +46,16 @@ class Session {
     std::shared_ptr<const RowSet> Query(std::string_view sql);
 
   private:
+    template <class Kept, class Read>
+    std::shared_ptr<const Kept> Shared(const std::string& key, Read&& read);
     template <class Read>
-    auto Shared(char kind, const BoundSql& sql, Read&& read);
-    std::string ReaderKey(const TableInfo& table) const;
+    auto Run(const BoundSql& sql, Read&& read);
+    std::string TableKey(const TableInfo& table) const;
 
     std::shared_ptr<CompanyDatabase> database_;
     Reader reader_;
     base::Clock clock_;
+    std::string reader_key_;  // alike for readers who see the same
 };
 
 }  // namespace zebtell::erp

@@ -26,12 +26,14 @@ std::string DescriptionOf(const std::function<void()>& work) {
 
 class SqliteTest : public PortalTest {
   protected:
+    void SetUp() override { connection_ = company_->MakeBackend()->Connect(Access::kRead); }
     std::string Value(const std::string& expression, std::vector<base::Value> values = {}) {
-        const auto connection = company_->MakeBackend()->Connect(Access::kRead);
-        const auto cursor = connection->Query({"select " + expression, std::move(values)});
+        const auto cursor = connection_->Query({"select " + expression, std::move(values)});
         return cursor->Next() ? (cursor->Get(0).IsNull() ? "null" : cursor->Get(0).ToPlainText())
                               : "no row";
     }
+
+    std::unique_ptr<Connection> connection_;
 };
 INSTANTIATE_TEST_SUITE_P(Databases,
                          SqliteTest,
@@ -114,27 +116,25 @@ TEST_P(SqliteTest, BoundValuesComeBack) {
 }
 
 TEST_P(SqliteTest, ReadingConnectionsCanNotWrite) {
-    const auto connection = company_->MakeBackend()->Connect(Access::kRead);
     for (const char* sql : {"delete from GRTax",
                             "create table x (a)",
                             "attach 'x.db' as x",
                             "select 1; delete from GRTax",
                             ""}) {
-        EXPECT_EQ(ErrorOf([&] { connection->Execute({sql, {}}); }), kStatementFailed) << sql;
+        EXPECT_EQ(ErrorOf([&] { connection_->Execute({sql, {}}); }), kStatementFailed) << sql;
     }
     EXPECT_EQ(company_->Show("select count(*) from GRTax"), "2;");
 }
 
 TEST_P(SqliteTest, LongStatementsEnd) {
-    const auto connection = company_->MakeBackend()->Connect(Access::kRead);
     EXPECT_EQ(DescriptionOf([&] {
-                  connection->Execute(
+                  connection_->Execute(
                       {"with recursive n(i) as (select 1 union all select i + 1 "
                        "from n) select count(*) from n",
                        {}});
               }),
               "The statement took too long");
-    connection->Execute({"select count(*) from GRTax", {}});
+    connection_->Execute({"select count(*) from GRTax", {}});
 }
 
 TEST_P(SqliteTest, ABusyDatabaseIsReadAndRefusesToStore) {

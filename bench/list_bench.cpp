@@ -1,0 +1,150 @@
+// Lists and pages of a company with 30,000 articles, as the catalogue reads them. ZEBTELL_BENCH_DB
+// names the database file to use (it is made when it is missing).
+#include <benchmark/benchmark.h>
+
+#include <cstdlib>
+#include <filesystem>
+#include <string>
+
+#include "base/text.h"
+#include "data/price_query_text.h"
+#include "demo/demo_company.h"
+#include "erp/database.h"
+#include "erp/sqlite/connection.h"
+
+namespace zebtell::erp {
+namespace {
+
+constexpr int kPageLength = 20;
+constexpr const char* kFields[] = {"ID",
+                                   "Price",
+                                   "IDGRArticle",
+                                   "GRArticle.Code",
+                                   "GRArticle.Name",
+                                   "GRArticle.Unit",
+                                   "GRArticle.Stock",
+                                   "GRArticle.GRTax.TaxPercent"};
+
+std::string DatabaseFile() {
+    const char* named = std::getenv("ZEBTELL_BENCH_DB");
+    const auto path = named ? std::filesystem::path(named)
+                            : std::filesystem::temp_directory_path() / "zebtell-bench-30000.db";
+    if (!std::filesystem::exists(path)) {
+        demo::DemoOptions options;
+        options.articles = 30000;
+        options.today = *base::DateTime::FromIso("2026-03-15");
+        demo::MakeDemoCompany(path, options);
+    }
+    return path.string();
+}
+
+const std::string& Path() {
+    static const std::string path = DatabaseFile();
+    return path;
+}
+
+std::unique_ptr<data::DataApplication> LogOn() {
+    static Databases databases([] { return base::DateTime::Now(); });
+    auto portal = databases.NewApplication();
+    portal->Initialise("ZEBTell", "WEBUser", "WEBGuest", "Külaline");
+    portal->Logon(data::DatabaseType::kSqlite, Path(), "mari", "mari-demo");
+    return portal;
+}
+
+std::shared_ptr<data::RecordList> OpenCatalogue(data::DataApplication& portal, int least_id) {
+    return portal.OpenList("GRPriceListRel", "ID > " + std::to_string(least_id), "GRArticle.Code");
+}
+
+// What fetching as many pairs costs without the runtime.
+void FetchPairs(benchmark::State& state) {
+    sqlite::SqliteConnection connection(Path(), Access::kRead, {});
+    for (auto _ : state) {
+        const auto cursor =
+            connection.Query({"select ID, IDGRArticle from GRPriceListRel limit 30000", {}});
+        std::int64_t sum = 0;
+        while (cursor->Next()) {
+            sum += cursor->GetInteger(0) + cursor->GetInteger(1);
+        }
+        benchmark::DoNotOptimize(sum);
+    }
+}
+BENCHMARK(FetchPairs)->Unit(benchmark::kMillisecond);
+
+// A filter that nobody has used before: the list is read.
+void OpenNewList(benchmark::State& state) {
+    const auto portal = LogOn();
+    const char* order = state.range(0) == 0 ? "" : "GRArticle.Code";
+    int least_id = -1;
+    for (auto _ : state) {
+        const std::string filter = "ID > " + std::to_string(least_id--);
+        benchmark::DoNotOptimize(portal->OpenList("GRPriceListRel", filter, order)->Count());
+    }
+}
+BENCHMARK(OpenNewList)->ArgName("by code")->Arg(0)->Arg(1)->Unit(benchmark::kMillisecond);
+
+void OpenKnownList(benchmark::State& state) {
+    const auto portal = LogOn();
+    OpenCatalogue(*portal, 0);
+    for (auto _ : state) {
+        benchmark::DoNotOptimize(OpenCatalogue(*portal, 0)->Count());
+    }
+}
+BENCHMARK(OpenKnownList)->Unit(benchmark::kMicrosecond);
+
+std::size_t ReadPage(data::RecordList& list, std::int64_t first) {
+    std::size_t bytes = 0;
+    for (std::int64_t i = first; i < first + kPageLength; ++i) {
+        const auto row = list.Item(i);
+        for (const char* field : kFields) {
+            bytes += row->GetField(field).ToPlainText().size();
+        }
+    }
+    return bytes;
+}
+
+// Every page is another one; with 0 pages to choose from none has been read before.
+void TurnPage(benchmark::State& state) {
+    const auto portal = LogOn();
+    const std::int64_t pages = state.range(0);
+    std::int64_t page = 0;
+    int least_id = 0;
+    auto list = OpenCatalogue(*portal, least_id);
+    for (auto _ : state) {
+        const std::int64_t first = page * kPageLength + 1;
+        benchmark::DoNotOptimize(ReadPage(*list, first));
+        page = (page + (pages == 0 ? 3 : 1)) % (pages == 0 ? 1400 : pages);
+    }
+}
+BENCHMARK(TurnPage)->ArgName("pages")->Arg(0)->Arg(10)->Unit(benchmark::kMicrosecond);
+
+void FindByArticle(benchmark::State& state) {
+    const auto portal = LogOn();
+    const auto list = OpenCatalogue(*portal, 0);
+    const std::string criterion =
+        "idgrarticle=" + list->Item(20000)->GetField("IDGRArticle").ToPlainText();
+    for (auto _ : state) {
+        benchmark::DoNotOptimize(list->Find(criterion));
+    }
+}
+BENCHMARK(FindByArticle)->Unit(benchmark::kMicrosecond);
+
+// The customer's prices of a page of articles.
+void PagePrices(benchmark::State& state) {
+    const auto portal = LogOn();
+    std::string text = base::ReplacedNoCase(data::DefaultPriceQueryText(), "#P", "1");
+    text = base::ReplacedNoCase(text, "#H", "1");
+    std::int64_t first = 0;
+    for (auto _ : state) {
+        std::string articles = std::to_string(first + 1);
+        for (std::int64_t i = 2; i <= kPageLength; ++i) {
+            articles += "," + std::to_string(first + i);
+        }
+        const auto prices = portal->OpenQuery(base::ReplacedNoCase(text, "#A", articles), 0, 0);
+        benchmark::DoNotOptimize(prices->Count());
+        first = (first + kPageLength) % (state.range(0) * kPageLength);
+    }
+}
+BENCHMARK(PagePrices)->ArgName("pages")->Arg(1400)->Arg(10)->Unit(benchmark::kMicrosecond);
+
+}  // namespace
+}  // namespace zebtell::erp
