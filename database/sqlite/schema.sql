@@ -205,7 +205,8 @@ CREATE TABLE SDOrderRow (
     RowNo INTEGER NOT NULL,
     IDGRArticle INTEGER NOT NULL REFERENCES GRArticle(ID),
     Quantity REAL NOT NULL DEFAULT 0 CHECK (Quantity >= 0),
-    -- What the customer pays for one, without tax; UnitPrice is the list price of one.
+    -- What the customer pays for one, without tax: Amount counts with Price, and UnitPrice is what
+    -- the documents show.
     Price MONEY NOT NULL DEFAULT 0 CHECK (Price >= 0),
     UnitPrice MONEY NOT NULL DEFAULT 0 CHECK (UnitPrice >= 0),
     PriceCut REAL NOT NULL DEFAULT 0,

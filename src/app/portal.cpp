@@ -61,7 +61,6 @@ class Portal::Parts {
           server(OptionsOf(settings), [this](http::Request request, http::Responder respond) {
               runtime(std::move(request), std::move(respond));
           }) {
-        global_settings.Load();
         server.Start();
     }
 
@@ -76,6 +75,9 @@ class Portal::Parts {
         options.session_idle = std::chrono::minutes(settings.SessionMinutes);
         options.max_sessions = static_cast<std::size_t>(settings.MaxSessions);
         options.worker_threads = static_cast<unsigned>(settings.Threads);
+        // SQLite reads what it has at once; a database on the network may keep a thread waiting.
+        options.quick_on_io_threads =
+            global_settings.Current()->Type == data::DatabaseType::kSqlite;
         options.static_files = [this](const http::Request& request) {
             auto answer = static_files.Serve(request);
             return answer ? answer : status.Serve(request);

@@ -139,7 +139,7 @@ void DocumentWriter::WriteRows(Kind& kind, TradeDocument& document, OwnOf own_of
                       row.article->id,
                       row.quantity,
                       row.price,
-                      row.list_price,
+                      row.price,
                       row.price_cut,
                       row.amount,
                       row.article->tax_percent,

@@ -130,7 +130,7 @@ Settings LoadSettings(const std::filesystem::path& component_folder) {
 
 SettingsStore::SettingsStore(std::filesystem::path component_folder)
     : component_folder_(std::move(component_folder)),
-      current_(std::make_shared<const Settings>()) {}
+      current_(std::make_shared<const Settings>(LoadSettings(component_folder_))) {}
 
 void SettingsStore::Load() {
     current_.store(std::make_shared<const Settings>(LoadSettings(component_folder_)));

@@ -56,7 +56,8 @@ struct Settings {
 // Reads "ZEBTell.ini" in `component_folder`; a missing file gives the defaults.
 Settings LoadSettings(const std::filesystem::path& component_folder);
 
-// The process's settings: replaced whole by each new session, read by all threads.
+// The process's settings: read at the start, replaced whole by each new session, read by all
+// threads.
 class SettingsStore {
   public:
     explicit SettingsStore(std::filesystem::path component_folder);

@@ -41,7 +41,7 @@ class Template {
 
 // Where a page must end rather than go on: a template that repeats itself without end.
 struct ExpandLimits {
-    std::size_t tags = 2'000'000;
+    std::size_t tags = 1'000'000;
     std::size_t bytes = 64U << 20U;
     std::size_t depth = 100;  // of tags made by tags
 };

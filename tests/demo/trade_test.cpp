@@ -45,10 +45,10 @@ constexpr Rule kRules[] = {
      "b.DocDate < a.DocDate"},
     {"articles that have no price are not bought",
      "select ID from SDOrderRow where UnitPrice = 0 or Amount = 0"},
-    {"a row's price is of the customer's list",
+    {"a row's price is its list price with the percentage",
      "select r.ID from SDOrderRow r join SDOrder o on o.ID = r.IDSDOrder left join SQPriceList5 p "
      "on p.IDGRPriceList = o.IDGRPriceList and p.IDGRArticle = r.IDGRArticle where r.Status = 0 "
-     "and p.Price is not r.UnitPrice"},
+     "and ifnull(abs(p.Price * (100 + r.PriceCut) / 100 - r.Price), 1) > 0.0051"},
     {"every company but the blocked ones ordered in the newest half year",
      "select ID from GRCompany c where OrdersAllowed <> exists (select 1 from SDOrder o where "
      "o.IDGRCompany = c.ID and DocDate > '2026-05-20')"},

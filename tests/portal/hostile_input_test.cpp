@@ -67,7 +67,7 @@ TEST_F(HostileInput, TextsStayTexts) {
             EXPECT_EQ(mari.status(), 200) << text;
             EXPECT_THAT(mari.page(), Not(HasSubstr("<script"))) << text;
             EXPECT_THAT(mari.page(), Not(HasSubstr("<b"))) << text;
-            EXPECT_THAT(mari.page(), Not(HasSubstr("ZEB:W"))) << text;
+            EXPECT_THAT(mari.page(), Not(HasSubstr("<ZEB:"))) << text;
             EXPECT_EQ(mari.page().find('\0'), std::string::npos) << text;
         }
     }
@@ -89,7 +89,7 @@ TEST_F(HostileInput, NoTextBringsOutWhatBelongsToOthers) {
         "*",
         "%",
         "SA-1",
-        "x' OR EXISTS(SELECT ID FROM SDOrder WHERE Explanation='SALADUS') OR 'a'='b"};
+        "x' OR EXISTS(SELECT ID FROM SDOrder WHERE Explanation LIKE 'SAL*') OR 'a'='b"};
     Browser mari = MariLoggedOn();
     mari.Get("Kaubainfo");
     const auto expect_nothing_foreign = [&](std::string_view where, std::string_view text) {
