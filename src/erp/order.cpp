@@ -1,7 +1,5 @@
 #include "erp/order.h"
 
-#include <algorithm>
-
 #include "base/runtime_error.h"
 #include "data/record.h"
 #include "erp/order_price.h"
@@ -10,6 +8,9 @@
 
 namespace zebtell::erp {
 namespace {
+
+// As many as the pages count.
+constexpr std::size_t kMostRows = 32'000;
 
 [[noreturn]] void Refuse(const char* why) {
     throw base::RuntimeError(base::errors::kInvalidCall, why);
@@ -138,12 +139,12 @@ void Order::DeleteRow(const OrderRow& row) {
 }
 
 std::shared_ptr<OrderRow> Order::AddRow() {
+    if (rows.size() >= kMostRows) {
+        Refuse("The order has too many rows");
+    }
     auto row = std::make_shared<OrderRow>(session_->database().Table(kOrderRowTable));
     row->id = NewRowId();
-    std::int64_t last = 0;
-    for (const auto& other : rows) {
-        last = std::max(last, other->fields.Integer("RowNo"));
-    }
+    const std::int64_t last = rows.empty() ? 0 : rows.back()->fields.Integer("RowNo");
     row->fields.Set("RowNo", last + 1);
     for (const char* number : {"Quantity", "PriceCut", "TaxPercent", "DeliveredQuantity"}) {
         row->fields.Set(number, 0.0);

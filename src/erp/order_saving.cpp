@@ -199,6 +199,7 @@ bool Saving::NeedsReview() {
         }
         const auto own = prices.find(row->fields.Integer("IDGRArticle"));
         return own == prices.end() || row->fields.Money("Price") < own->second.price ||
+               (row->unit_price_set && row->fields.Money("UnitPrice") < own->second.price) ||
                row->fields.Money("Amount") <
                    base::Multiplied(own->second.price, row->fields.Number("Quantity"), 2);
     });

@@ -132,11 +132,15 @@ TEST_P(OrderSavingTest, OrdersWithoutRowsAreRefused) {
 }
 
 TEST_P(OrderSavingTest, PricesBelowTheOwnAreMarkedForReview) {
-    const auto review = [&](const char* amount, const char* sql) {
+    const auto review = [&](const char* amount, const char* sql, const char* unit_price = "") {
         const auto order = portal_->OpenTable("SDOrder")->Open(0);
         const auto row = Add(*order, 3, 2);  // at 2.63
         if (*amount != '\0') {
             row->SetField("Amount", amount);
+            row->Update(0);
+        }
+        if (*unit_price != '\0') {
+            row->SetField("UnitPrice", unit_price);
             row->Update(0);
         }
         if (*sql != '\0') {
@@ -148,6 +152,8 @@ TEST_P(OrderSavingTest, PricesBelowTheOwnAreMarkedForReview) {
     EXPECT_EQ(review("", ""), "0 5.26;");
     EXPECT_EQ(review("5.25", ""), "1 5.25;");
     EXPECT_EQ(review("9", ""), "0 9;");
+    EXPECT_EQ(review("", "", "2.63"), "0 5.26;");
+    EXPECT_EQ(review("", "", "2.62"), "1 5.26;");
     EXPECT_EQ(review("", "update GRPriceListRel set Price = 3.10 where ID = 103"), "1 5.26;");
     EXPECT_EQ(review("", "delete from GRPriceListRel where ID = 103"), "1 5.42;");
 }
