@@ -3,9 +3,16 @@
 #include <limits>
 
 #include "base/rounding.h"
+#include "base/text.h"
 #include "host/texts.h"
 
 namespace zebtell::host {
+namespace {
+
+// A session keeps no more of what a stranger typed.
+constexpr std::size_t kLongestName = 200;
+
+}  // namespace
 
 bool IsBlocked(SessionState& state, const Settings& settings) {
     if (settings.Blocking <= 0) return false;
@@ -25,7 +32,7 @@ void CountFailure(SessionState& state, const Settings& settings, std::string_vie
     if (blocking.FailedAttempts < std::numeric_limits<std::int16_t>::max()) {
         ++blocking.FailedAttempts;
     }
-    blocking.LastAttemptedName = user;
+    blocking.LastAttemptedName = base::FirstCharacters(user, kLongestName);
     if (blocking.FailedAttempts > settings.Blocking) blocking.Blocked = true;
 }
 

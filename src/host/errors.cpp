@@ -26,7 +26,8 @@ ErrorText DescribeError(const std::exception& error) {
     const base::RuntimeError described = base::AsRuntimeError(error);
     const bool own = dynamic_cast<const base::RuntimeError*>(&error) != nullptr;
     // The portal's own descriptions hold no markup; a library's text may hold anything.
-    const std::string text = described.description();
+    // Neither may begin what looks like another entry of the log.
+    const std::string text = base::WithoutControls(described.description());
     return {HexNumber(described.number()) + " (" + std::to_string(described.number()) + ")",
             own ? text : markup::Escaped(text)};
 }

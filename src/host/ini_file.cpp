@@ -24,7 +24,10 @@ std::vector<std::string> ReadLines(const std::filesystem::path& file) {
     if (text.starts_with("\xEF\xBB\xBF")) text.erase(0, 3);
     text = base::Utf8FromEither(std::move(text));
     std::vector<std::string> lines;
-    for (std::string_view line : base::Split(text, '\n')) lines.emplace_back(line);
+    for (std::string_view line : base::Split(text, '\n')) {
+        if (line.ends_with('\r')) line.remove_suffix(1);
+        lines.emplace_back(line);
+    }
     if (!lines.empty() && lines.back().empty()) lines.pop_back();
     return lines;
 }
@@ -97,7 +100,7 @@ void clsIniFile::SetValue(std::string_view section, std::string_view key, std::s
         lines.push_back(std::move(line));
     }
     std::ofstream out(FileName, std::ios::binary | std::ios::trunc);
-    for (const std::string& each : lines) out << TrimmedLine(each) << "\r\n";
+    for (const std::string& each : lines) out << each << "\r\n";
 }
 
 }  // namespace zebtell::host

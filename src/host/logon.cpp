@@ -121,6 +121,9 @@ void Logon_Logon(SessionState& state, web::Call& call) {
     if (state.logon.LoggedOn) {
         if (EqualNoCase(credentials.user, state.logon.UserName) &&
             EqualNoCase(credentials.password, state.logon.Password)) {
+            // The form was sent twice: the browser may have dropped the first answer, and with it
+            // the session's new token.
+            call.RenewToken();
             GoOn(state, call);
             return;
         }

@@ -1,5 +1,7 @@
 #include "host/session_state.h"
 
+#include <utility>
+
 #include "base/runtime_error.h"
 #include "host/log.h"
 
@@ -35,7 +37,8 @@ void ResetUserState(SessionState& state) {
 
     // Whatever was read for one user is gone before another can log on.
     state.basket = {};
-    state.basket_form = {};
+    // How typed quantities are rounded is the templates' word, not the user's.
+    state.basket_form.QuantityDecimals = std::exchange(state.basket_form, {}).QuantityDecimals;
     state.catalogue = {};
     state.confirmation = {};
     state.company = {};
@@ -47,7 +50,7 @@ void ResetUserState(SessionState& state) {
     for (auto& [key, query] : state.templates.Queries) query.ZEBApp = nullptr;
     state.templates.Queries.clear();
     state.templates.SavedValues.reset();
-    state.templates.OrdersAllowed = false;
+    state.templates.OrdersAllowed = {};
     state.logon.Application.reset();
 }
 

@@ -42,6 +42,7 @@ struct Row {
     std::string_view section;
     std::string_view key;
     void (*apply)(Settings&, const std::string& value);
+    bool with_id_card = false;  // read only while ID-card log-on is on
 };
 
 // Read in this order. A failure in the first table ends the loading.
@@ -63,9 +64,7 @@ constexpr Row kFirstRows[] = {
      "UserID",
      [](Settings& s, const std::string& v) { s.UserID = OrDefault(v, "WebGuest"); }},
     {"WebGuest", "PassWord", [](Settings& s, const std::string& v) { s.PassWord = v; }},
-    {"WEBLog",
-     "LogFile",
-     [](Settings& s, const std::string& v) { s.LogFile = OrDefault(v, s.LogFile); }},
+    {"WEBLog", "LogFile", [](Settings& s, const std::string& v) { s.LogFile = v; }},
     {"WEBLog", "Level", [](Settings& s, const std::string& v) { s.Level = LevelOf(v); }},
 };
 
@@ -74,6 +73,15 @@ constexpr Row kSecondRows[] = {
     {"Session", "Blocking", [](Settings& s, const std::string& v) { s.Blocking = NotNegative(v); }},
     {"Session", "Timeout", [](Settings& s, const std::string& v) { s.Timeout = NotNegative(v); }},
     {"ESTEID", "Required", ApplyRequired},
+    {"ESTEID", "AuthMode", [](Settings& s, const std::string& v) { s.ESTEID.AuthMode = v; }, true},
+    {"ESTEID", "UserID", [](Settings& s, const std::string& v) { s.ESTEID.UserID = v; }, true},
+    {"ESTEID", "Password", [](Settings& s, const std::string& v) { s.ESTEID.Password = v; }, true},
+    {"ESTEID",
+     "OCSP",
+     [](Settings& s, const std::string& v) {
+         s.ESTEID.OCSP = base::Value(v).IsNumeric() && base::Value(v).ToDouble() != 0;
+     },
+     true},
     {"Mail", "From", [](Settings& s, const std::string& v) { s.Mail.From = v; }},
     {"Mail", "BCC", [](Settings& s, const std::string& v) { s.Mail.BCC = v; }},
     {"Mail", "SMTP", [](Settings& s, const std::string& v) { s.Mail.SMTP = v; }},
@@ -83,18 +91,6 @@ constexpr Row kSecondRows[] = {
          s.Mail.Port = base::Value(v).IsNumeric() ? Integer16(v) : std::int16_t{25};
      }},
     {"Server", "Region", [](Settings& s, const std::string& v) { s.Region = v; }},
-};
-
-// Read only while ID-card log-on is on.
-constexpr Row kEsteidRows[] = {
-    {"ESTEID", "AuthMode", [](Settings& s, const std::string& v) { s.ESTEID.AuthMode = v; }},
-    {"ESTEID", "UserID", [](Settings& s, const std::string& v) { s.ESTEID.UserID = v; }},
-    {"ESTEID", "Password", [](Settings& s, const std::string& v) { s.ESTEID.Password = v; }},
-    {"ESTEID",
-     "OCSP",
-     [](Settings& s, const std::string& v) {
-         s.ESTEID.OCSP = base::Value(v).IsNumeric() && base::Value(v).ToDouble() != 0;
-     }},
 };
 
 }  // namespace
@@ -114,16 +110,15 @@ Settings LoadSettings(const std::filesystem::path& component_folder) {
     Settings settings;
     clsIniFile file;
     file.FileName = component_folder / "ZEBTell.ini";
-    settings.LogFile = (component_folder / "ZEBTell.log").string();
     const auto apply = [&](const Row& row) {
         return base::IgnoreErrors([&] { row.apply(settings, file.Value(row.section, row.key)); });
     };
     for (const Row& row : kFirstRows) {
         if (!apply(row)) return settings;
     }
-    for (const Row& row : kSecondRows) apply(row);
-    if (settings.ESTEID.IsOn) {
-        for (const Row& row : kEsteidRows) apply(row);
+    if (settings.LogFile.empty()) settings.LogFile = (component_folder / "ZEBTell.log").string();
+    for (const Row& row : kSecondRows) {
+        if (!row.with_id_card || settings.ESTEID.IsOn) apply(row);
     }
     return settings;
 }

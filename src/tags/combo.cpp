@@ -4,7 +4,7 @@
 
 #include "base/text.h"
 #include "markup/escape.h"
-#include "tags/field_output.h"
+#include "tags/field_text.h"
 
 namespace zebtell::tags {
 

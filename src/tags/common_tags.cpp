@@ -2,7 +2,7 @@
 #include "markup/escape.h"
 #include "tags/combo.h"
 #include "tags/custom_func.h"
-#include "tags/field_output.h"
+#include "tags/field_text.h"
 #include "tags/page_globals.h"
 #include "tags/page_tags.h"
 #include "tags/query_tags.h"
@@ -67,12 +67,12 @@ bool SetStoreID(TagCall& call) {
 }
 
 bool OrdersAllowed(TagCall& call) {
-    ShowIf(call, call.state.templates.OrdersAllowed);
+    ShowIf(call, call.state.templates.OrdersAllowed == true);
     return kHandled;
 }
 
 bool OrdersBlocked(TagCall& call) {
-    ShowIf(call, !call.state.templates.OrdersAllowed);
+    ShowIf(call, call.state.templates.OrdersAllowed != true);
     return kHandled;
 }
 
@@ -96,9 +96,9 @@ bool RoundQuantity(TagCall& call) {
 // Not handled in spite of its output, as templates know it; no later handler has this tag.
 bool Company(TagCall& call) {
     const auto& company = call.state.company;
-    WriteField(call,
-               company.CompanyLoaded ? company.CompanyRecord.get() : nullptr,
-               call.tag.TemplateContents());
+    WriteReference(call,
+                   company.CompanyLoaded ? company.CompanyRecord.get() : nullptr,
+                   call.tag.TemplateContents());
     return !kHandled;
 }
 

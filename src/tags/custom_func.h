@@ -19,7 +19,8 @@ std::string CleanPriceQueryText(std::string_view text);
 //
 //   A | B                 the first that is neither empty nor "&nbsp;"
 //   ?field=compare;output the output, as it stands, if the test holds ("=" "#" "<" ">")
-//   field;modifier        "dd.mm.yyyy;zebdate", "zeb:len=20,quote,nospace", or a format picture
+//   field;modifier        "dd.mm.yyyy;zebdate", "zeb:len=20,quote,nospace", "zeb:attr", or a
+//                         format picture
 //   field                 formatted by `format` unless that is empty
 //
 // Errors in reading and converting end the call with what is there so far, mostly "".
@@ -27,8 +28,5 @@ std::string FormatFieldValue(data::Record& record,
                              std::string_view reference,
                              std::string_view format,
                              const base::Region& region);
-
-// The value as FormatFieldValue ends: "&nbsp;" for nothing, < and > escaped.
-std::string FieldHtml(std::string text);
 
 }  // namespace zebtell::tags

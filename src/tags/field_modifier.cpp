@@ -16,6 +16,7 @@ constexpr std::string_view kDateWord = "zebdate";
 constexpr std::string_view kDateEnd = ";zebdate";
 constexpr std::string_view kTextStart = "zeb:";
 constexpr std::string_view kLength = "len=";
+constexpr std::string_view kAttribute = "attr";
 
 bool IsText(std::string_view modifier) {
     return base::StartsWithNoCase(modifier, kTextStart);
@@ -73,7 +74,8 @@ std::string TextByWords(const base::Value& value,
     if (const std::size_t at = base::FindNoCase(modifier, kLength); at != std::string_view::npos) {
         CutTo(LeadingNumber(modifier.substr(at + kLength.size())), text);
     }
-    if (Holds(modifier, "quote")) text = WithQuotesEscaped(text);
+    // An attribute's text is escaped whole, and once.
+    if (Holds(modifier, "quote") && !Holds(modifier, kAttribute)) text = WithQuotesEscaped(text);
     return text;
 }
 
@@ -91,8 +93,10 @@ bool NeedsValue(std::string_view modifier) {
     return IsDate(modifier) || IsText(modifier);
 }
 
-bool KeepsEmpty(std::string_view modifier) {
-    return IsText(modifier) && !IsDate(modifier) && Holds(modifier, "nospace");
+Ending EndingOf(std::string_view modifier) {
+    if (!IsText(modifier) || IsDate(modifier)) return Ending::kShown;
+    if (Holds(modifier, kAttribute)) return Ending::kAttribute;
+    return Holds(modifier, "nospace") ? Ending::kKeptEmpty : Ending::kShown;
 }
 
 }  // namespace zebtell::tags

@@ -12,6 +12,7 @@ namespace zebtell::tags {
 //
 //   zebdate   dd.mm.yyyy;zebdate      a date by its picture, "" for the zero date
 //   zeb:len=20,quote,nospace          trimmed text: cut to a width, with quotation marks escaped
+//   zeb:attr                          trimmed text, for the value of an input that is posted back
 //   0.00                              anything else is a format picture
 //
 // RuntimeError for what does not convert.
@@ -22,7 +23,12 @@ std::string ModifiedText(const base::Value& value,
 // Whether the modifier converts the value, which null does not stand.
 bool NeedsValue(std::string_view modifier);
 
-// Whether the modifier lets an empty result stay empty.
-bool KeepsEmpty(std::string_view modifier);
+// How the text becomes HTML.
+enum class Ending {
+    kShown,      // "&nbsp;" for nothing, < and > escaped
+    kKeptEmpty,  // the same, but nothing stays nothing
+    kAttribute,  // every character that means something in HTML escaped, nothing stays nothing
+};
+Ending EndingOf(std::string_view modifier);
 
 }  // namespace zebtell::tags

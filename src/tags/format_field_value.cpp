@@ -1,6 +1,7 @@
 #include "base/format.h"
 #include "base/ignore_errors.h"
 #include "base/text.h"
+#include "markup/escape.h"
 #include "tags/custom_func.h"
 #include "tags/field_condition.h"
 #include "tags/field_modifier.h"
@@ -21,6 +22,14 @@ struct Source {
     base::Value Field(std::string_view name) const { return record.GetField(base::Trimmed(name)); }
 };
 
+// "&nbsp;" for nothing, < and > escaped.
+std::string FieldHtml(std::string text) {
+    if (text.empty()) return std::string(kNothing);
+    // Two searches by byte are several times faster than one for either.
+    if (text.find('<') == npos && text.find('>') == npos) return text;
+    return base::Replaced(base::Replaced(text, "<", "&lt;"), ">", "&gt;");
+}
+
 // Null has no text: a field that holds it ends the call like an error, without the cost of one.
 
 std::string Bare(const Source& source, std::string_view field) {
@@ -33,7 +42,9 @@ std::string Modified(const Source& source, std::string_view field, std::string_v
     const base::Value value = source.Field(field);
     if (value.IsNull() && NeedsValue(modifier)) return {};
     std::string text = ModifiedText(value, modifier, source.region);
-    return text.empty() && KeepsEmpty(modifier) ? text : FieldHtml(std::move(text));
+    const Ending ending = EndingOf(modifier);
+    if (ending == Ending::kAttribute) return markup::Escaped(text);
+    return text.empty() && ending == Ending::kKeptEmpty ? text : FieldHtml(std::move(text));
 }
 
 std::string Conditional(const Source& source, std::string_view reference) {
@@ -76,13 +87,6 @@ std::string FormatFieldValue(data::Record& record,
     const Source source{record, format, region};
     return reference.find('|') == npos ? OnePart(source, reference)
                                        : FirstWithText(source, reference);
-}
-
-std::string FieldHtml(std::string text) {
-    if (text.empty()) return std::string(kNothing);
-    // Two searches by byte are several times faster than one for either.
-    if (text.find('<') == npos && text.find('>') == npos) return text;
-    return base::Replaced(base::Replaced(text, "<", "&lt;"), ">", "&gt;");
 }
 
 }  // namespace zebtell::tags

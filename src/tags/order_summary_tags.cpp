@@ -1,6 +1,6 @@
 #include "base/ignore_errors.h"
 #include "tags/custom_func.h"
-#include "tags/field_output.h"
+#include "tags/field_text.h"
 #include "tags/orders_enable.h"
 #include "tags/page_tags.h"
 #include "tags/row_loop.h"
@@ -32,7 +32,7 @@ void TellRidu(TagCall& call) {
 
 void Tellimus(TagCall& call) {
     const auto& basket = call.state.basket.Basket;
-    WriteField(call, basket ? basket->Header().get() : nullptr, Reference(call));
+    WriteReference(call, basket ? basket->Header().get() : nullptr, Reference(call));
 }
 
 void TellimusExists(TagCall& call) {
@@ -50,7 +50,7 @@ void TellimusRida(TagCall& call) {
     if (reference == "#") {
         call.tag.Write(std::to_string(row));
     } else {
-        WriteField(call, call.state.basket.BasketRows->Item(row).get(), reference);
+        WriteReference(call, call.state.basket.BasketRows->Item(row).get(), reference);
     }
 }
 
@@ -67,12 +67,13 @@ void ContactExists(TagCall& call) {
 
 void Parent(TagCall& call) {
     const auto& company = call.state.company;
-    WriteField(call, company.ParentLoaded ? company.ParentRecord.get() : nullptr, Reference(call));
+    WriteReference(
+        call, company.ParentLoaded ? company.ParentRecord.get() : nullptr, Reference(call));
 }
 
 void Contact(TagCall& call) {
     const auto& company = call.state.company;
-    WriteField(
+    WriteReference(
         call, company.ContactLoaded ? company.ContactRecord.get() : nullptr, Reference(call));
 }
 
@@ -86,7 +87,7 @@ void Employee(TagCall& call) {
     call.tag.Hide();
     const auto& company = call.state.company.CompanyRecord;
     if (!company) return;
-    WriteField(call, company->Children("EREmployee")->Item(1).get(), Reference(call));
+    WriteReference(call, company->Children("EREmployee")->Item(1).get(), Reference(call));
 }
 
 }  // namespace

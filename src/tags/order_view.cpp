@@ -1,5 +1,7 @@
 #include "tags/order_view.h"
 
+#include <utility>
+
 #include "base/rounding.h"
 #include "tags/field_text.h"
 
@@ -28,7 +30,11 @@ bool Line(TagCall& c,
         return true;
     }
     current = list->Item(cursor);
-    cursor < count ? c.tag.Repeat(tag) : c.tag.Show();
+    if (cursor < count) {
+        c.tag.Repeat(tag);
+    } else {
+        c.tag.Show();
+    }
     cursor = base::ToInteger16(cursor + 1.0);
     return true;
 }
@@ -61,37 +67,33 @@ bool TaxField(TagCall& c) {
 }
 
 bool JustSaved(TagCall& c) {
-    bool& just_saved = c.state.confirmation.OrderJustSaved;
-    just_saved ? c.tag.Show() : c.tag.Hide();
-    just_saved = false;
+    ShowIf(c, std::exchange(c.state.confirmation.OrderJustSaved, false));
     return true;
 }
 
 bool OrderExists(TagCall& c) {
-    Shown(c).Header ? c.tag.Show() : c.tag.Hide();
+    ShowIf(c, Shown(c).Header != nullptr);
     return true;
 }
 
 bool OrderNotExists(TagCall& c) {
-    Shown(c).Header ? c.tag.Hide() : c.tag.Show();
+    ShowIf(c, Shown(c).Header == nullptr);
     return true;
 }
 
 // Staff have not begun to process the order: its customer may still change it.
 bool OrderOpen(TagCall& c) {
+    c.tag.Hide();  // also when the state can't be read
     data::Record* header = Shown(c).Header.get();
-    const bool open = header != nullptr && header->GetField("State").ToInteger64() == 0;
-    open ? c.tag.Show() : c.tag.Hide();
+    ShowIf(c, header != nullptr && header->GetField("State").ToInteger64() == 0);
     return true;
 }
 
 bool OrderLink(TagCall& c) {
-    data::Record* header = Shown(c).Header.get();
-    if (header == nullptr) {
-        c.tag.Hide();
-        return true;
+    c.tag.Hide();
+    if (data::Record* header = Shown(c).Header.get()) {
+        c.tag.Write(c.call.URLFor("Tellimus", "ID_" + header->GetField("ID").ToPlainText()));
     }
-    c.tag.Write(c.call.URLFor("Tellimus", "ID_" + header->GetField("ID").ToPlainText()));
     return true;
 }
 

@@ -2,7 +2,7 @@
 
 #include "base/runtime_error.h"
 #include "base/text.h"
-#include "tags/field_output.h"
+#include "tags/field_text.h"
 #include "tags/form_values.h"
 
 namespace zebtell::tags {
@@ -27,7 +27,7 @@ void EnableOrders(TagCall& call) {
     call.tag.Hide();
     const std::string reference = Reference(call);
     const auto parts = base::Split(reference, '.');
-    bool& allowed = call.state.templates.OrdersAllowed;
+    auto& allowed = call.state.templates.OrdersAllowed;
     if (parts.size() == 1) {
         allowed = PartnerField(call, parts[0]).ToBoolean();
     } else if (parts.size() > 1 && QueryExists(call.state, parts[0], call.page)) {

@@ -5,7 +5,7 @@
 #include "base/runtime_error.h"
 #include "base/text.h"
 #include "tags/custom_func.h"
-#include "tags/field_output.h"
+#include "tags/field_text.h"
 #include "tags/form_values.h"
 #include "tags/page_tags.h"
 
@@ -102,7 +102,7 @@ bool QueryFieldTag(TagCall& call) {
     if (query.RecNo > records->Count()) {
         call.tag.Hide();
     } else {
-        WriteField(call, records->Item(query.RecNo).get(), Reference(call));
+        WriteReference(call, records->Item(query.RecNo).get(), Reference(call));
     }
     return kHandled;
 }

@@ -63,18 +63,30 @@ TEST(Logon, SecondLogonWithTheSameCredentialsAsksNoDatabase) {
     EXPECT_TRUE(s.state->logon.LoggedOn);
 }
 
+// A browser that sends the form twice may drop the first answer and its cookie.
+TEST(Logon, FormSentTwiceLeavesTheBrowserWithACookie) {
+    TestSession s;
+    s.Ask(Logon_Logon, Form("mari", "Sala"));
+    s.Ask(Logon_Logon, Form("mari", "Sala"));
+    EXPECT_TRUE(s.call->renew_token());
+    s.Ask(Logon_Logon, Form("mari", "wrong"));
+    EXPECT_FALSE(s.call->renew_token());
+}
+
 TEST(Logon, OtherCredentialsLeaveNothingOfTheFirstUser) {
     TestSession s;
     s.Ask(Logon_Logon, Form("mari", "Sala"));
     s.state->basket.Basket = std::make_shared<fake::Document>();
     s.state->catalogue.LastFind = "salajane";
     s.state->templates.SavedValues.emplace()["save_x"] = "1";
+    s.state->basket_form.QuantityDecimals = 3;
     s.Ask(Logon_Logon, Form("mari", "wrong"));
     EXPECT_FALSE(s.state->logon.LoggedOn);
     EXPECT_EQ(s.state->logon.Application, nullptr);
     EXPECT_EQ(s.state->basket.Basket, nullptr);
     EXPECT_EQ(s.state->catalogue.LastFind, "");
     EXPECT_FALSE(s.state->templates.SavedValues);
+    EXPECT_EQ(s.state->basket_form.QuantityDecimals, 3);  // the templates' word
     EXPECT_EQ(s.state->company.CompanyRecord, nullptr);
     EXPECT_EQ(s.state->Message, "Vale kasutajanimi või parool!");
 }
@@ -125,8 +137,25 @@ TEST(Logon, NoLimitCountsNothing) {
     TestSession s("[Session]\nBlocking=0\nTimeout=10\n");
     for (int i = 0; i < 20; ++i) s.Ask(Logon_Logon, Form("mari", "wrong"));
     EXPECT_EQ(s.state->blocking.FailedAttempts, 0);
+    EXPECT_EQ(s.state->blocking.LastAttemptedName, "");
     s.Ask(Logon_Logon, Form("mari", "Sala"));
     EXPECT_TRUE(s.state->logon.LoggedOn);
+}
+
+TEST(Logon, HugeNamesAreRefusedAndNotKept) {
+    TestSession s("[Session]\nBlocking=3\n[WEBLog]\nLevel=Debug\n");
+    s.Ask(Logon_Logon, Form(std::string(1'000'000, 'x'), std::string(1'000'000, 'y')));
+    EXPECT_EQ(s.state->blocking.LastAttemptedName, std::string(200, 'x'));
+    EXPECT_EQ(s.state->logon.UserName, "");
+    EXPECT_LT(s.Log().size(), 1000U);
+}
+
+TEST(Logout, OfASessionThatIsNotLoggedOn) {
+    TestSession s;
+    s.Ask(Logout_Respond);
+    EXPECT_EQ(s.templates_written, 1);
+    EXPECT_TRUE(s.call->release_instance());
+    EXPECT_THAT(s.Log(), testing::HasSubstr("[-]  logged out\r\n"));
 }
 
 TEST(Logout, ReleasesTheInstanceAndKeepsOnlyTheName) {

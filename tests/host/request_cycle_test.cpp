@@ -116,6 +116,17 @@ TEST(ErrorPage, ForeignExceptionsShowAsText) {
     });
 }
 
+TEST(HandlerError, IsOneLineOfTheDetailedLog) {
+    TestSession s("[WEBLog]\nLevel=Detail\n");
+    const bool done = Guarded(*s.state, "Yld_Respond", [] {
+        throw base::RuntimeError(5, "bad\r\n2026-11-21 14:05:09[1][U] evil");
+    });
+    EXPECT_FALSE(done);
+    EXPECT_THAT(
+        s.Log(),
+        testing::EndsWith("[][-] Yld_Respond error:bad  2026-11-21 14:05:09[1][U] evil\r\n"));
+}
+
 TEST(FatalError, LogsAndLogsOff) {
     TestSession s;
     s.state->logon.LoggedOn = true;

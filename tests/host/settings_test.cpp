@@ -33,6 +33,17 @@ TEST_F(SettingsTest, MissingFileGivesTheDefaults) {
     EXPECT_EQ(s.Mail.Port, 25);
 }
 
+// A folder in the file's place: reading it fails, which a missing file does not.
+TEST_F(SettingsTest, FailureAtTheFirstKeysEndsTheLoading) {
+    std::filesystem::create_directory(folder.path() / "ZEBTell.ini");
+    const Settings s = LoadSettings(folder.path());
+    EXPECT_EQ(s.Language, "EST");
+    EXPECT_EQ(s.DispName, "");
+    EXPECT_EQ(s.LogFile, "");
+    EXPECT_EQ(s.Level, log_None);
+    EXPECT_EQ(s.Mail.Port, 0);
+}
+
 TEST_F(SettingsTest, EveryRuleOfAKey) {
     const auto level = [&](std::string_view word) {
         return Load("[WEBLog]\nLevel=" + std::string(word)).Level;
@@ -56,6 +67,7 @@ TEST_F(SettingsTest, EveryRuleOfAKey) {
     EXPECT_EQ(blocking("-5"), 0);
     EXPECT_EQ(blocking("many"), 0);
     EXPECT_EQ(blocking("40000"), 0);
+    EXPECT_EQ(blocking("2,5"), 2);
 
     const auto port = [&](std::string_view word) {
         return Load("[Mail]\nPort=" + std::string(word)).Mail.Port;
@@ -77,6 +89,13 @@ TEST_F(SettingsTest, IdCardKeysAreReadOnlyWhileItIsOn) {
     const auto https = Load("[ESTEID]\nRequired=HTTPS" + keys).ESTEID;
     EXPECT_TRUE(https.IsOn && !https.IsRequired && https.OverHttps);
     EXPECT_EQ(https.UserID, "U");
+    const auto lower = Load("[ESTEID]\nRequired=https" + keys).ESTEID;
+    EXPECT_TRUE(lower.IsOn && !lower.IsRequired && !lower.OverHttps);
+    const auto ocsp = [&](const std::string& word) {
+        return Load("[ESTEID]\nRequired=yes\nOCSP=" + word).ESTEID.OCSP;
+    };
+    EXPECT_TRUE(ocsp("-1"));
+    EXPECT_FALSE(ocsp("0") || ocsp("") || ocsp("true"));
 }
 
 TEST_F(SettingsTest, LanguagesByTheirFirstTwoLetters) {
@@ -108,6 +127,12 @@ TEST_F(SettingsTest, FileFormat) {
         {"8-bit text", "[S]\nK=K\xFClaline", "Külaline"},
         {"UTF-8 text", "[S]\nK=Külaline", "Külaline"},
         {"cut behind 253 characters", "[S]\nK=" + std::string(300, 'x'), std::string(253, 'x')},
+        {"cut by characters, not bytes",
+         "[S]\nK=" + std::string(252, 'x') + "\u00FC\u00FC",
+         std::string(252, 'x') + "\u00FC"},
+        {"cut 8-bit text alike",
+         "[S]\nK=" + std::string(252, 'x') + "\xFC\xFC",
+         std::string(252, 'x') + "\u00FC"},
         {"nonsense lines", "=\n[\n]x\n[S\n===\n[S]\nK=v", "v"},
     };
     for (const Case& c : cases) {
@@ -120,6 +145,10 @@ TEST_F(SettingsTest, FileFormat) {
 
 TEST_F(SettingsTest, WritingKeepsTheRest) {
     clsIniFile file;
+    folder.Write("old.ini", "; why\n[S]\n  K = 1\n\n  odd line\n");
+    file.FileName = folder.path() / "old.ini";
+    file.SetValue("S", "L", "2");
+    EXPECT_EQ(folder.Read("old.ini"), "; why\r\n[S]\r\n  K = 1\r\n\r\n  odd line\r\nL=2\r\n");
     file.FileName = folder.path() / "new.ini";
     file.Section = "S";
     file.SetValue("", "K", "1");

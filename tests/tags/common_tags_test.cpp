@@ -118,11 +118,17 @@ TEST(CommonTags, PageGlobals) {
     Session session;
     EXPECT_EQ(session.Ask(CommonTags, "ZEB:WEBLanguage", " EN "), (Answer{"", true}));
     EXPECT_EQ(PageLanguage, "EN");
-    IDCardLogon = true;
+    host::Settings settings;
+    settings.ESTEID.IsOn = true;
+    ResetPageGlobals(settings);
+    EXPECT_EQ(PageLanguage, "");
     EXPECT_EQ(session.Ask(CommonTags, "ZEB:LogonEID", "x"), (Answer{"x", true}));
     EXPECT_EQ(session.Ask(CommonTags, "ZEB:LogonPWD", "x"), (Answer{"", true}));
-    ResetPageGlobals();
+
+    session.Ask(CommonTags, "ZEB:WEBLanguage", "EN");
+    WebClassHooks().BeginRequest(session.state, session.call);
     EXPECT_EQ(PageLanguage, "");
+    EXPECT_EQ(session.state.SessionID, "1");
     EXPECT_EQ(session.Ask(CommonTags, "ZEB:LogonPWD", "x"), (Answer{"x", true}));
 }
 

@@ -124,6 +124,14 @@ TEST_F(FormatFieldValueTest, TextModifiers) {
         {"nospace with text", "Markup;zeb:NoSpace", "", "&lt;b&gt;&amp;&lt;/b&gt;"},
         {"null", "Null;zeb:", "", ""},
         {"number", "Price;zeb:", "", "1234,5"},
+        {"attribute", "Quotes;zeb:attr", "", "5&quot; &#39;x&#39;\r\nend"},
+        {"attribute, escaped once", "Markup;zeb:ATTR", "", "&lt;b&gt;&amp;amp;&lt;/b&gt;"},
+        {"attribute, a tag in it", "Tag;zeb:attr", "", "&lt;ZEB:WEBUser&gt;x&lt;/ZEB:WEBUser&gt;"},
+        {"attribute, nothing", "Blanks;zeb:attr", "", ""},
+        {"attribute, null", "Null;zeb:attr", "", ""},
+        {"attribute wins over quote", "Quotes;zeb:quote,attr", "", "5&quot; &#39;x&#39;\r\nend"},
+        {"attribute, cut before", "Quotes;zeb:attr,len=7", "", "5&quot; &#39;..."},
+        {"attribute, number", "Price;zeb:attr", "", "1234,5"},
     };
     for (const auto& row : rows) EXPECT_EQ(Formatted(row.reference), row.expected) << row.label;
 }

@@ -18,7 +18,7 @@ struct TemplateValues {
     NoCaseMap<data::clsQuery> Queries;                  // by page + "::" + name
     std::optional<NoCaseMap<std::string>> SavedValues;  // absent until a form had a saved field
     std::int32_t StoreID = 0;
-    bool OrdersAllowed = false;
+    std::optional<bool> OrdersAllowed;  // absent: no template has asked yet
     std::string PriceQueryText;
 };
 
