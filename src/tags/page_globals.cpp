@@ -16,8 +16,8 @@ void ResetPageGlobals(const host::Settings& settings) {
 web::WebClass<host::SessionState> WebClassHooks() {
     auto hooks = host::WebClassHooks();
     hooks.BeginRequest = [](host::SessionState& state, web::Call& call) {
-        base::IgnoreErrors([&] { ResetPageGlobals(*state.settings()); });
         host::WebClass_BeginRequest(state, call);
+        base::IgnoreErrors([&] { ResetPageGlobals(*state.settings()); });
     };
     return hooks;
 }
