@@ -38,7 +38,7 @@ bool OrderRow::IsToStore() const {
     return fields.Integer("IDGRArticle") != 0 && fields.Number("Quantity") > 0;
 }
 
-Order::Order(std::shared_ptr<Session> session)
+Order::Order(const std::shared_ptr<Session>& session)
     : header(session->database().Table(kOrderTable)), session_(session), linked_(session) {}
 
 base::Value Order::GetHeaderField(std::string_view name) {

@@ -42,7 +42,7 @@ struct OrderImage {
 // An order being edited: its header and rows in memory. Used by one thread at a time.
 class Order {
   public:
-    explicit Order(std::shared_ptr<Session> session);
+    explicit Order(const std::shared_ptr<Session>& session);
 
     const std::shared_ptr<Session>& session() const { return session_; }
     bool IsStored() const { return id != 0; }

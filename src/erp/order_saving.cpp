@@ -4,7 +4,7 @@
 
 #include "base/runtime_error.h"
 #include "erp/order_image.h"
-#include "erp/order_price.h"
+#include "erp/order_review.h"
 #include "erp/order_sums.h"
 #include "erp/transaction.h"
 #include "erp/write_sql.h"
@@ -60,7 +60,6 @@ class Saving {
     void StoreRows();
     void RemoveRows();
     void StoreTaxes();
-    bool NeedsReview();
     std::optional<OrderImage> Image(std::int64_t id);
     ColumnValues Sums();
     ColumnValues ValuesOf(const RecordFields& fields, std::span<const char* const> columns) const;
@@ -179,32 +178,6 @@ void Saving::StoreTaxes() {
     }
 }
 
-// Whether a row costs less than the customer's own price as it is now. The row is stored as asked.
-bool Saving::NeedsReview() {
-    std::vector<std::int64_t> articles;
-    for (const auto& row : order_.rows) {
-        articles.push_back(row->fields.Integer("IDGRArticle"));
-    }
-    const Reader& reader = session_.reader();
-    const auto cursor = connection_.Query(
-        session_.database().translator().Select(reader, OwnPricesSql(reader, articles)));
-    RowSet rows(std::make_shared<const FieldSet>(cursor->Columns()));
-    while (cursor->Next()) {
-        rows.Append(*cursor);
-    }
-    const OwnPrices prices = ReadOwnPrices(reader, rows);
-    return std::any_of(order_.rows.begin(), order_.rows.end(), [&](const auto& row) {
-        if (row->IsFixed() || !row->IsToStore()) {
-            return false;
-        }
-        const auto own = prices.find(row->fields.Integer("IDGRArticle"));
-        return own == prices.end() || row->fields.Money("Price") < own->second.price ||
-               (row->unit_price_set && row->fields.Money("UnitPrice") < own->second.price) ||
-               row->fields.Money("Amount") <
-                   base::Multiplied(own->second.price, row->fields.Number("Quantity"), 2);
-    });
-}
-
 // Also of an order that the reader sees only from now on.
 std::optional<OrderImage> Saving::Image(std::int64_t id) {
     Reader reader = session_.reader();
@@ -219,7 +192,7 @@ ColumnValues Saving::Sums() {
     return {{"Amount", sums.amount},
             {"TaxAmount", sums.tax_amount},
             {"AmountWTax", sums.with_tax()},
-            {"NeedsReview", NeedsReview()}};
+            {"NeedsReview", NeedsReview(order_, connection_)}};
 }
 
 ColumnValues Saving::ValuesOf(const RecordFields& fields,

@@ -14,7 +14,7 @@ namespace zebtell::erp {
 // A select statement's result. Its columns IDX are links where the schema knows a table for them.
 class QueryRows {
   public:
-    QueryRows(std::shared_ptr<Session> session,
+    QueryRows(const std::shared_ptr<Session>& session,
               std::shared_ptr<const RowSet> rows,
               const TableInfo* table)
         : session_(session), rows_(std::move(rows)), table_(table), linked_(session) {}

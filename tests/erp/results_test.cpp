@@ -1,3 +1,4 @@
+#include "erp/connection_pool.h"
 #include "erp/key_table.h"
 #include "erp/result_cache.h"
 
@@ -95,6 +96,53 @@ TEST(KeyTableTest, EveryOfManyKeysIsFound) {
         ASSERT_EQ(keys.Find(0, rows[i][0]), i);
         ASSERT_EQ(keys.Find(0, rows[i][0] + 1), std::nullopt);
     }
+}
+
+// A database whose every statement is a commit.
+struct Counting : Connection {
+    explicit Counting(std::int64_t& commits) : commits(commits) {}
+    std::unique_ptr<Cursor> Query(const BoundSql&) override { return nullptr; }
+    void Execute(const BoundSql&) override { ++commits; }
+    std::int64_t LastIdentity() override { return 0; }
+    void Begin() override {}
+    void Commit() override {}
+    void Rollback() noexcept override {}
+    std::int64_t DataVersion() override { return commits; }
+    std::int64_t& commits;
+};
+
+struct CountingBackend : Backend {
+    std::unique_ptr<Connection> Connect(Access) override {
+        ++connections;
+        return std::make_unique<Counting>(commits);
+    }
+    DatabaseDescription Describe(Connection&) override { return {}; }
+    Dialect dialect() const override { return Dialect::kSqlite; }
+    std::int64_t commits = 0;
+    int connections = 0;
+};
+
+TEST(ConnectionPoolTest, WhatThePoolHasWrittenIsNoticedAtOnce) {
+    CountingBackend backend;
+    ConnectionPool pool(backend);
+    std::int64_t version = pool.DataVersion();
+    for (int i = 0; i < 1000; ++i) {
+        pool.Write()->Execute({});
+        const std::int64_t next = pool.DataVersion();
+        ASSERT_GT(next, version);
+        version = next;
+    }
+    EXPECT_EQ(pool.DataVersion(), version);
+    {
+        const Lease first = pool.Read();
+        const Lease second = pool.Read();
+    }
+    pool.Read();
+    // One that looks, one that writes, two that read.
+    EXPECT_EQ(backend.connections, 4);
+    pool.Write().Drop();
+    pool.Write();
+    EXPECT_EQ(backend.connections, 5);
 }
 
 }  // namespace
