@@ -16,8 +16,8 @@ namespace {
 
 using TlsStream = asio::ssl::stream<Socket>;
 
-constexpr std::size_t kBodyReadSize = 32U * 1024;
-constexpr std::size_t kSlowestBytesPerSecond = 16U * 1024;
+constexpr std::size_t kBodyReadSize = std::size_t{32} * 1024;
+constexpr std::size_t kSlowestBytesPerSecond = std::size_t{16} * 1024;
 constexpr std::string_view kContinue = "HTTP/1.1 100 Continue\r\n\r\n";
 
 // The same protocol over a plain socket and over TLS. At most one read and one write are under way.

@@ -7,10 +7,11 @@ namespace zebtell::http {
 
 // What a client may send and hold. A request beyond them is refused, not cut.
 struct Limits {
-    std::size_t request_line_bytes = 8U * 1024;
-    std::size_t header_bytes = 16U * 1024;  // all headers of a request, without the request line
+    std::size_t request_line_bytes = std::size_t{8} * 1024;
+    std::size_t header_bytes =
+        std::size_t{16} * 1024;  // all headers of a request, without the request line
     std::size_t header_count = 100;
-    std::size_t body_bytes = 1024U * 1024;
+    std::size_t body_bytes = std::size_t{1024} * 1024;
     std::size_t requests_per_connection = 1000;
     std::size_t connections = 20'000;
     std::size_t connections_per_address = 0;  // 0: no limit; trusted proxies have none

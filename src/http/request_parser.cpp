@@ -62,7 +62,7 @@ class StrictParser : public beast_http::basic_parser<true> {
     void on_response_impl(int, boost::beast::string_view, int, error_code&) override {}
     void on_body_init_impl(const boost::optional<std::uint64_t>& length, error_code&) override {
         // Bytes that were only announced get no memory.
-        constexpr std::uint64_t kMostReserved = 64U * 1024;
+        constexpr std::uint64_t kMostReserved = std::uint64_t{64} * 1024;
         if (length) request.body.reserve(std::min(*length, kMostReserved));
     }
     std::size_t on_body_impl(boost::beast::string_view bytes, error_code&) override {

@@ -16,7 +16,7 @@ namespace {
 
 namespace fs = std::filesystem;
 
-constexpr std::uintmax_t kMaxBytes = 4U * 1024 * 1024;
+constexpr std::uintmax_t kMaxBytes = std::uintmax_t{4} * 1024 * 1024;
 constexpr std::chrono::seconds kCheckInterval(1);
 
 constexpr std::pair<std::string_view, std::string_view> kContentTypes[] = {
