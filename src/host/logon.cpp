@@ -57,7 +57,7 @@ std::int64_t PriceList(DataApplication& application, Record& user, Record* settl
     return application.DefaultLink("SDOrder", "GRPriceList");
 }
 
-CompanyState LoadCompany(DataApplication& application, std::shared_ptr<Record> user) {
+CompanyState LoadCompany(DataApplication& application, const std::shared_ptr<Record>& user) {
     CompanyState company;
     company.PartnerRecord = user;
     const std::int64_t partner = LinkID(*user, "IDPartner");
@@ -84,9 +84,9 @@ void LogOn(SessionState& state, const Settings& settings, const Credentials& cre
     auto application = state.services.make_application();
     // The guest's name here is this word, whatever the settings call him.
     application->Initialise("ZEBTell", "WEBUser", "WEBGuest", "Külaline");
-    auto user =
+    const auto user =
         application->Logon(settings.Type, settings.Path, credentials.user, credentials.password);
-    state.company = LoadCompany(*application, std::move(user));
+    state.company = LoadCompany(*application, user);
     state.logon.Application = std::move(application);
     state.logon.LoggedOn = true;
     state.logon.UserName = credentials.user;
