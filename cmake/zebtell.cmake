@@ -12,6 +12,11 @@ if(ZEBTELL_SANITIZE)
     add_link_options(-fsanitize=${ZEBTELL_SANITIZE})
 endif()
 
+if(ZEBTELL_SANITIZE STREQUAL thread)
+    # ThreadSanitizer does not follow memory fences.
+    add_compile_definitions(BOOST_ASIO_DISABLE_FENCED_BLOCK)
+endif()
+
 find_package(Threads REQUIRED)
 find_package(PkgConfig REQUIRED)
 

@@ -128,11 +128,14 @@ SettingsStore::SettingsStore(std::filesystem::path component_folder)
       current_(std::make_shared<const Settings>(LoadSettings(component_folder_))) {}
 
 void SettingsStore::Load() {
-    current_.store(std::make_shared<const Settings>(LoadSettings(component_folder_)));
+    auto loaded = std::make_shared<const Settings>(LoadSettings(component_folder_));
+    const std::lock_guard lock(mutex_);
+    current_ = std::move(loaded);
 }
 
 std::shared_ptr<const Settings> SettingsStore::Current() const {
-    return current_.load();
+    const std::lock_guard lock(mutex_);
+    return current_;
 }
 
 }  // namespace zebtell::host

@@ -1,9 +1,9 @@
 #pragma once
 
-#include <atomic>
 #include <cstdint>
 #include <filesystem>
 #include <memory>
+#include <mutex>
 #include <string>
 
 #include "base/region.h"
@@ -67,7 +67,8 @@ class SettingsStore {
 
   private:
     std::filesystem::path component_folder_;
-    std::atomic<std::shared_ptr<const Settings>> current_;
+    mutable std::mutex mutex_;
+    std::shared_ptr<const Settings> current_;
 };
 
 }  // namespace zebtell::host
