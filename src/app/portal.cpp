@@ -8,6 +8,7 @@
 #include "http/server.h"
 #include "http/static_files.h"
 #include "markup/template_cache.h"
+#include "tags/page_globals.h"
 #include "web/page_runtime.h"
 
 namespace zebtell::app {
@@ -54,7 +55,7 @@ class Portal::Parts {
                   [this] { return runtime.CountSessions(); }}),
           runtime(
               PortalPages(),
-              host::WebClassHooks(),
+              tags::WebClassHooks(),
               [this] { return host::NewSession(services); },
               templates,
               RuntimeOptionsOf(settings)),
