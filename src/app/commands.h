@@ -5,6 +5,7 @@
 #include <string>
 
 #include "demo/demo_company.h"
+#include "erp/user_admin.h"
 #include "host/server_settings.h"
 
 namespace zebtell::app {
@@ -20,5 +21,15 @@ int Serve(const std::filesystem::path& folder,
 int MakeDemo(const std::filesystem::path& folder,
              const std::filesystem::path& templates,
              const demo::DemoOptions& options);
+
+// Says what is wrong with the settings, the database and the templates; 1 when anything is.
+// `templates` is empty for the folder that the settings name.
+int Check(const std::filesystem::path& folder, const std::filesystem::path& templates);
+
+// Users of the database that the settings name. Passwords are asked for.
+int AddUser(const std::filesystem::path& folder, erp::UserAdmin::NewUser user);
+int SetUserPassword(const std::filesystem::path& folder, const std::string& name);
+int SetUserDisabled(const std::filesystem::path& folder, const std::string& name, bool disabled);
+int ListUsers(const std::filesystem::path& folder);
 
 }  // namespace zebtell::app

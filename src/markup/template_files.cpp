@@ -8,6 +8,7 @@
 
 #include "base/runtime_error.h"
 #include "base/text.h"
+#include "markup/template_source.h"
 
 namespace zebtell::markup {
 namespace {
@@ -19,9 +20,24 @@ constexpr std::size_t kMaxIncludeDepth = 20;
 constexpr std::string_view kByteOrderMark = "\xEF\xBB\xBF";
 constexpr std::string_view kIncludeStart = "<!--#include";
 
-[[noreturn]] void FailNotFound(std::string_view name) {
-    throw base::RuntimeError(kFileNotFound, "File not found: " + base::WithoutControls(name));
-}
+// Visitors hear of all faults in the same words; who reads a source hears the reason.
+class FileError : public base::RuntimeError {
+  public:
+    FileError(std::string_view name, std::string_view why)
+        : RuntimeError(kFileNotFound, "File not found: " + base::WithoutControls(name)),
+          why_(why) {}
+
+    std::string_view why() const { return why_; }
+
+  private:
+    std::string_view why_;
+};
+
+constexpr std::string_view kMissing = "is not there";
+constexpr std::string_view kOutside = "lies outside of the template folder";
+constexpr std::string_view kUnreadable = "can't be read";
+constexpr std::string_view kWithinItself = "includes itself";
+constexpr std::string_view kTooDeep = "is included too deeply";
 
 bool IsWithin(const fs::path& folder, const fs::path& file) {
     return std::mismatch(folder.begin(), folder.end(), file.begin(), file.end()).first ==
@@ -32,20 +48,22 @@ bool IsWithin(const fs::path& folder, const fs::path& file) {
 fs::path FindFile(const fs::path& folder, std::string_view name) {
     const fs::path relative{std::string(name)};
     const bool climbs = std::find(relative.begin(), relative.end(), "..") != relative.end();
-    if (name.empty() || name.find('\0') != name.npos || relative.is_absolute() || climbs)
-        FailNotFound(name);
+    if (relative.is_absolute() || climbs) throw FileError(name, kOutside);
+    if (name.empty() || name.find('\0') != name.npos) throw FileError(name, kMissing);
     std::error_code error;
     const fs::path root = fs::canonical(folder, error);
-    if (error) FailNotFound(name);
+    if (error) throw FileError(name, kMissing);
     fs::path file = fs::canonical(root / relative, error);
-    if (error || !IsWithin(root, file) || !fs::is_regular_file(file, error)) FailNotFound(name);
+    if (error) throw FileError(name, kMissing);
+    if (!IsWithin(root, file)) throw FileError(name, kOutside);
+    if (!fs::is_regular_file(file, error)) throw FileError(name, kMissing);
     return file;
 }
 
 std::string ReadFile(const fs::path& path, std::string_view name) {
     std::ifstream file(path, std::ios::binary);
     std::string text{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
-    if (!file.is_open() || file.bad()) FailNotFound(name);
+    if (!file.is_open() || file.bad()) throw FileError(name, kUnreadable);
     if (text.starts_with(kByteOrderMark)) text.erase(0, kByteOrderMark.size());
     return base::Utf8FromEither(std::move(text));
 }
@@ -96,30 +114,61 @@ std::optional<Include> FindInclude(std::string_view text, std::size_t from) {
 
 class Reader {
   public:
-    explicit Reader(const fs::path& folder) : folder_(folder) {}
+    // With a `source`, it is told where the text comes from, and includes that can't be read are
+    // left out instead of ending the reading.
+    explicit Reader(const fs::path& folder, TemplateSource* source = nullptr)
+        : folder_(folder), source_(source) {}
 
     void Append(std::string_view name) {
         const fs::path path = FindFile(folder_, name);
-        const bool includes_itself = std::find(open_.begin(), open_.end(), path) != open_.end();
-        if (includes_itself || open_.size() > kMaxIncludeDepth) FailNotFound(name);
-        open_.push_back(path);
+        if (std::find(open_.begin(), open_.end(), path) != open_.end())
+            throw FileError(name, kWithinItself);
+        if (open_.size() > kMaxIncludeDepth) throw FileError(name, kTooDeep);
         // The stamp comes first: a change while the file is read is then noticed later.
         result_.files.push_back(FileStamp::Of(path));
         const std::string text = ReadFile(path, name);
+        open_.push_back(path);
         std::size_t done = 0;
         while (const auto include = FindInclude(text, done)) {
-            result_.text.append(text, done, include->begin - done);
-            Append(include->file);
+            AppendPart(name, text, done, include->begin);
+            AppendInclude(name, text, *include);
             done = include->end;
         }
-        result_.text.append(text, done);
+        AppendPart(name, text, done, text.size());
         open_.pop_back();
     }
 
     TemplateText Take() { return std::move(result_); }
 
   private:
+    static std::size_t LineAt(std::string_view text, std::size_t at) {
+        return 1 + static_cast<std::size_t>(std::count(text.begin(), text.begin() + at, '\n'));
+    }
+
+    void AppendPart(std::string_view name,
+                    std::string_view text,
+                    std::size_t begin,
+                    std::size_t end) {
+        if (source_ != nullptr) {
+            source_->pieces.push_back(
+                {result_.text.size(), std::string(name), LineAt(text, begin)});
+        }
+        result_.text.append(text, begin, end - begin);
+    }
+
+    void AppendInclude(std::string_view name, std::string_view text, const Include& include) {
+        if (source_ == nullptr) return Append(include.file);
+        try {
+            Append(include.file);
+        } catch (const FileError& error) {
+            source_->faults.push_back({{std::string(name), LineAt(text, include.begin)},
+                                       std::string(include.file),
+                                       error.why()});
+        }
+    }
+
     const fs::path& folder_;
+    TemplateSource* source_;
     std::vector<fs::path> open_;  // the file being read and those that include it
     TemplateText result_;
 };
@@ -138,6 +187,14 @@ TemplateText ReadTemplate(const fs::path& folder, std::string_view file_name) {
     Reader reader(folder);
     reader.Append(file_name);
     return reader.Take();
+}
+
+TemplateSource ReadTemplateSource(const fs::path& folder, std::string_view file_name) {
+    TemplateSource source;
+    Reader reader(folder, &source);
+    reader.Append(file_name);
+    source.text = reader.Take().text;
+    return source;
 }
 
 }  // namespace zebtell::markup

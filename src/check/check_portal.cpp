@@ -1,0 +1,64 @@
+#include "check/check_portal.h"
+
+#include <algorithm>
+#include <memory>
+
+#include "base/runtime_error.h"
+#include "check/company_tables.h"
+#include "check/settings_check.h"
+#include "check/tables.h"
+#include "check/template_check.h"
+#include "erp/database.h"
+#include "host/ini_file.h"
+#include "host/settings.h"
+
+namespace zebtell::check {
+namespace {
+
+namespace fs = std::filesystem;
+
+void Append(std::vector<Finding>& to, std::vector<Finding> more) {
+    to.insert(to.end(), more.begin(), more.end());
+}
+
+// Null, and a finding, when it can't be read.
+std::unique_ptr<erp::CompanyDatabase> OpenDatabase(const fs::path& folder,
+                                                   std::vector<Finding>& findings) {
+    const host::Settings settings = host::LoadSettings(folder);
+    if (settings.Path.empty()) return nullptr;
+    const bool is_file = settings.Type == data::DatabaseType::kSqlite;
+    const std::string path = is_file ? (folder / settings.Path).string() : settings.Path;
+    try {
+        return std::make_unique<erp::CompanyDatabase>(erp::MakeBackend(settings.Type, path));
+    } catch (const base::RuntimeError& error) {
+        findings.push_back({"database", 0, error.description()});
+        return nullptr;
+    }
+}
+
+fs::path TemplateFolder(const fs::path& folder) {
+    host::clsIniFile file;
+    file.FileName = folder / "ZEBTell.ini";
+    return folder / file.Value("Server", "TemplateFolder");
+}
+
+}  // namespace
+
+std::vector<Finding> CheckPortal(const fs::path& component_folder,
+                                 const fs::path& template_folder,
+                                 std::span<const CheckedPage> pages) {
+    // Without settings it is the wrong folder, and all else would only say so again.
+    std::error_code error;
+    const bool has_settings = fs::exists(component_folder / "ZEBTell.ini", error);
+    std::vector<Finding> findings = SettingsFaults(component_folder);
+    if (!has_settings && template_folder.empty()) return findings;
+    const auto database = OpenDatabase(component_folder, findings);
+    if (database) Append(findings, MissingInDatabase(database->schema()));
+    const fs::path templates =
+        template_folder.empty() ? TemplateFolder(component_folder) : template_folder;
+    Append(findings, TemplateFaults(templates, pages, Tables(database.get())));
+    std::sort(findings.begin(), findings.end());
+    return findings;
+}
+
+}  // namespace zebtell::check
