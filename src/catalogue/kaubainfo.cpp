@@ -6,6 +6,7 @@
 #include "catalogue/price_list.h"
 #include "host/errors.h"
 #include "tags/custom_func.h"
+#include "tags/declarations.h"
 #include "tags/form_values.h"
 #include "tags/page_tags.h"
 
@@ -23,13 +24,22 @@ void ShowPage(SessionState& state, web::Call& call) {
     host::OrErrorPage(state, call, [&] { call.WriteTemplate(); });
 }
 
-// The three events that fill the list: an error leaves the list that was there, with a message.
+// The three events that fill the list: an error leaves the list that was there and its order, with
+// a message.
 template <class Build>
 void BuildAndShow(SessionState& state, web::Call& call, std::string_view handler, Build&& build) {
     if (!host::CheckLogon(state, call)) return;
-    host::Guarded(state, handler, build, [&] {
+    CatalogueState& catalogue = state.catalogue;
+    std::string order = catalogue.OrderText;
+    const auto work = [&] {
+        tags::ReadCatalogueDeclarations(state, call);
+        order = catalogue.OrderText;
+        build();
+    };
+    host::Guarded(state, handler, work, [&] {
         state.Message = kReadingFailed;
-        RewindPage(state.catalogue);
+        catalogue.OrderText = order;
+        RewindPage(catalogue);
     });
     ShowPage(state, call);
 }
@@ -69,6 +79,7 @@ std::int32_t CategoryNumber(const std::string& text) {
 
 void OpenFavourites(SessionState& state) {
     state.catalogue.CategoryId = kFavouritesCategory;
+    state.catalogue.LastFind.clear();  // the form is shown without it, and sorts without it
     const std::int32_t price_list = state.company.PriceListId;
     std::string favourites = state.catalogue.FavoritesText;
     if (price_list != 0 && !favourites.empty()) {
@@ -95,11 +106,23 @@ void OpenCategory(SessionState& state, const web::Call& call) {
 }
 
 void ChooseRow(SessionState& state, web::Call& call, std::string_view id) {
-    CatalogueState& catalogue = state.catalogue;
-    if (catalogue.ListQuery) {
-        state.basket_form.RowToAdd = catalogue.ListQuery->Find("ID=" + std::string(id));
-    }
+    const auto& list = state.catalogue.ListQuery;
+    state.basket_form.RowToAdd = list ? list->Find("ID=" + std::string(id)) : nullptr;
     call.NextItem("Lisamine");
+}
+
+// Without a list there is nothing to turn: the page is opened as for the first time.
+void Turn(SessionState& state,
+          web::Call& call,
+          std::string_view handler,
+          std::string_view command) {
+    if (!state.catalogue.ListQuery) return Kaubainfo_Respond(state, call);
+    if (!host::CheckLogon(state, call)) return;
+    host::Guarded(state, handler, [&] {
+        if (!command.empty()) TurnPage(state.catalogue, command);
+        RewindPage(state.catalogue);
+    });
+    ShowPage(state, call);
 }
 
 }  // namespace
@@ -110,10 +133,12 @@ void Kaubainfo_Respond(SessionState& state, web::Call& call) {
     if (!catalogue.ListFresh) catalogue.PageNumber = 1;
     catalogue.ListFresh = false;
     RewindPage(catalogue);
+    const std::string message = state.Message;
     ShowPage(state, call);
     // The catalogue opens with the favourites, once the template has said which they are.
     if (!catalogue.FavoritesText.empty() && !catalogue.ListQuery) {
         call.response.Clear();
+        state.Message = message;
         call.RedirectTo("Kaubainfo", "Favorites");
     }
 }
@@ -124,14 +149,13 @@ void Kaubainfo_ProcessTag(SessionState& state, web::Call& call, markup::Tag& tag
 }
 
 void Kaubainfo_UserEvent(SessionState& state, web::Call& call, std::string_view event) {
-    if (!host::CheckLogon(state, call)) return;
-    const auto work = [&] {
-        if (base::StartsWithNoCase(event, "ID_")) return ChooseRow(state, call, event.substr(3));
-        if (base::EndsWithNoCase(event, "Page")) TurnPage(state.catalogue, event);
-        RewindPage(state.catalogue);
-    };
-    host::Guarded(state, "Kaubainfo_UserEvent", work);
-    if (!base::StartsWithNoCase(event, "ID_")) ShowPage(state, call);
+    if (base::StartsWithNoCase(event, "ID_")) {
+        if (!host::CheckLogon(state, call)) return;
+        host::Guarded(
+            state, "Kaubainfo_UserEvent", [&] { ChooseRow(state, call, event.substr(3)); });
+    } else {
+        Turn(state, call, "Kaubainfo_UserEvent", base::EndsWithNoCase(event, "Page") ? event : "");
+    }
 }
 
 void Kaubainfo_Favorites(SessionState& state, web::Call& call) {
@@ -154,12 +178,7 @@ void Kaubainfo_Otsing(SessionState& state, web::Call& call) {
 }
 
 void Kaubainfo_Navigate(SessionState& state, web::Call& call) {
-    if (!host::CheckLogon(state, call)) return;
-    host::Guarded(state, "Kaubainfo_Navigate", [&] {
-        TurnPage(state.catalogue, tags::CleanFormValue(call.request.Value("Nav")));
-        RewindPage(state.catalogue);
-    });
-    ShowPage(state, call);
+    Turn(state, call, "Kaubainfo_Navigate", tags::CleanFormValue(call.request.Value("Nav")));
 }
 
 }  // namespace zebtell::catalogue

@@ -1,6 +1,7 @@
 #include "catalogue/option_lists.h"
 
 #include "base/text.h"
+#include "host/texts.h"
 #include "markup/escape.h"
 
 namespace zebtell::catalogue {
@@ -9,6 +10,7 @@ namespace {
 constexpr std::string_view kPlain = "<OPTION VALUE=\"";
 constexpr std::string_view kSelected = "<OPTION SELECTED VALUE=\"";
 constexpr int kYearsBack = 10;
+constexpr host::LocalText kLanguageCodes = {"ET", "EN", "LV"};
 
 void AppendOption(std::string& out, std::int64_t value, std::string_view html, bool selected) {
     out.append(selected ? kSelected : kPlain).append(std::to_string(value)).append("\">");
@@ -76,12 +78,13 @@ std::string DayOptions(base::DateTime date) {
     return NumberOptions(1, 31, date.Calendar().day);
 }
 
-std::string MonthOptions(base::DateTime date, const base::Region& region) {
+std::string MonthOptions(base::DateTime date, host::UserLanguage language) {
+    const base::Region& names = base::RegionFor(kLanguageCodes.In(language));
     std::string out;
     for (int month = 1; month <= 12; ++month) {
         AppendOption(out,
                      month,
-                     region.months[static_cast<std::size_t>(month - 1)],
+                     names.months[static_cast<std::size_t>(month - 1)],
                      month == date.Calendar().month);
     }
     return out;

@@ -24,7 +24,8 @@ std::string RecordOptions(data::RecordList& list,
                           const base::Region& region);
 
 std::string DayOptions(base::DateTime date);
-std::string MonthOptions(base::DateTime date, const base::Region& region);
+// Names of the months in the user's language, whatever the region for numbers and dates is.
+std::string MonthOptions(base::DateTime date, host::UserLanguage language);
 // From ten years back to `today`'s year.
 std::string YearOptions(base::DateTime date, base::DateTime today);
 
