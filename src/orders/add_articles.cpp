@@ -4,7 +4,9 @@
 
 #include "host/errors.h"
 #include "orders/header_fields.h"
+#include "orders/permission.h"
 #include "orders/wanted_articles.h"
+#include "tags/declarations.h"
 #include "tags/form_values.h"
 
 namespace zebtell::orders {
@@ -60,6 +62,8 @@ void AddAll(SessionState& state,
 void Kaubainfo_Lisamine(SessionState& state, web::Call& call) {
     if (!host::CheckLogon(state, call)) return;
     const auto work = [&] {
+        tags::ReadCatalogueDeclarations(state, call);
+        if (RefusesOrders(state, call)) return;
         Refusals refusals;
         const auto wanted = ReadWantedArticles(state, call.request, refusals);
         AddAll(state, wanted, tags::IsUniqueField(call.request, "ID"), refusals);

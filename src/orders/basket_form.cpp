@@ -7,6 +7,7 @@
 #include "orders/header_fields.h"
 #include "orders/refusals.h"
 #include "tags/custom_func.h"
+#include "tags/declarations.h"
 #include "tags/form_values.h"
 
 namespace zebtell::orders {
@@ -118,6 +119,7 @@ void PressButtons(SessionState& state, web::Call& call) {
     if (!Posted(call, "Vormista").empty()) {
         state.basket_form.ReturnPage = "Kaubainfo";
         call.NextItem("Kinnitus");
+        if (!Posted(call, "Vormista_Muuda").empty()) ChangeBasket(state, call);
     }
     if (!Posted(call, "Order_Clear").empty()) {
         data::DiscardBasket(state.basket);
@@ -141,7 +143,10 @@ void OnCatalogue(SessionState& state, web::Call& call, std::string_view handler,
 }  // namespace
 
 void Kaubainfo_Tellimus(SessionState& state, web::Call& call) {
-    OnCatalogue(state, call, "Kaubainfo_Tellimus", [&] { PressButtons(state, call); });
+    OnCatalogue(state, call, "Kaubainfo_Tellimus", [&] {
+        tags::ReadCatalogueDeclarations(state, call);
+        PressButtons(state, call);
+    });
 }
 
 void Kaubainfo_MuudaRead(SessionState& state, web::Call& call) {

@@ -4,7 +4,8 @@
 
 namespace zebtell::orders {
 
-// The basket form beside the price list: clear, change, or go on to the confirmation.
+// The basket form beside the price list: clear, change, or go on to the confirmation. A form with
+// the field "Vormista_Muuda" has its changes applied before it goes on.
 void Kaubainfo_Tellimus(host::SessionState& state, web::Call& call);
 
 // Only the comments and further fields of the basket's rows.

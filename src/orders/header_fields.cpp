@@ -3,6 +3,7 @@
 #include "base/ignore_errors.h"
 #include "base/runtime_error.h"
 #include "base/text.h"
+#include "orders/first_error.h"
 #include "tags/custom_func.h"
 
 namespace zebtell::orders {
@@ -42,13 +43,15 @@ bool CreateBasketFromForm(SessionState& state, const web::Request& request) {
 
 void SetHeaderFields(SessionState& state, const web::Request& request) {
     const auto settings = state.settings();
+    FirstError refusal;
     ForEachHeaderField(request, [&](std::string_view name, const std::string& text) {
         base::Value value(text);
         const bool readable = !base::EndsWithNoCase(name, "date") || base::IgnoreErrors([&] {
             value = value.ToDateTime(settings->region());
         });
-        if (readable) state.basket.Basket->SetField(name, value);
+        if (readable) refusal.Try([&] { state.basket.Basket->SetField(name, value); });
     });
+    refusal.Rethrow();
 }
 
 void ChangeHeaderFields(SessionState& state, const web::Request& request) {

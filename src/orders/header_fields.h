@@ -12,7 +12,8 @@ void EnsureBasket(host::SessionState& state);
 bool CreateBasketFromForm(host::SessionState& state, const web::Request& request);
 
 // Sets every posted "SDOrder." field that is not empty. Names that end in "date" take dates; a
-// field whose date can't be read is skipped.
+// field whose date can't be read is skipped. A field that is refused does not keep back the
+// others: the first refusal is thrown when all are done.
 void SetHeaderFields(host::SessionState& state, const web::Request& request);
 
 // Sets the posted "SDOrder." fields that differ from the header's, as text.

@@ -115,7 +115,8 @@ void Kinnitus_UserEvent(SessionState& state, web::Call& call, std::string_view e
     host::Guarded(state, "Kinnitus_UserEvent", work, [&] {
         state.Message = "Probleem andmete lugemisel, proovige uuesti!";
     });
-    call.NextItem("Kinnitus");
+    // By a redirect: going back to the page must not open the order once more.
+    call.RedirectTo("Kinnitus");
 }
 
 void Kinnitatud_Respond(SessionState& state, web::Call& call) {

@@ -42,14 +42,29 @@ bool Order(TagCall& c) {
     return true;
 }
 
+// A row whose adding failed stands in the basket without a sum and a quantity, uncounted.
+bool IsCounted(data::Record& row) {
+    if (!row.GetField("@RowPrice").IsBlank()) return true;
+    const base::Value quantity = row.GetField("Quantity");
+    return !quantity.IsBlank() && quantity.ToDouble() != 0;
+}
+
+// What the totals hold of a row. The rows of a stored order have been counted by their sums.
+base::Currency CountedSum(data::Record& row) {
+    const base::Value sum = row.GetField("@RowPrice");
+    return sum.IsBlank() ? row.GetField("Amount").ToCurrency() : sum.ToCurrency();
+}
+
 void DeleteRow(SessionState& state, std::string_view position) {
     data::BasketValues& basket = state.basket;
     if (!basket.BasketRows) throw base::RuntimeError(base::errors::kObjectNotSet);
     const auto row = basket.BasketRows->Item(base::Value(position).ToInteger16());
     if (row->Status(data::kFixedRow)) throw base::RuntimeError(base::errors::kInvalidCall);
-    basket.BasketRowCount = base::ToInteger16(basket.BasketRowCount - 1.0);
-    base::IgnoreErrors([&] { basket.BasketQuantity -= row->GetField("Quantity").ToDouble(); });
-    base::IgnoreErrors([&] { basket.BasketTotal -= row->GetField("@RowPrice").ToCurrency(); });
+    if (IsCounted(*row)) {
+        basket.BasketRowCount = base::ToInteger16(basket.BasketRowCount - 1.0);
+        base::IgnoreErrors([&] { basket.BasketQuantity -= row->GetField("Quantity").ToDouble(); });
+        base::IgnoreErrors([&] { basket.BasketTotal -= CountedSum(*row); });
+    }
     base::IgnoreErrors([&] { row->Delete(); });
 }
 
@@ -77,7 +92,8 @@ void Koostamine_UserEvent(SessionState& state, web::Call& call, std::string_view
     host::Guarded(state, "Koostamine_UserEvent", [&] {
         if (base::StartsWithNoCase(event, "DEL_")) DeleteRow(state, event.substr(4));
     });
-    call.NextItem("Koostamine");
+    // By a redirect: the page loaded again must not take out one row more.
+    call.RedirectTo("Koostamine");
 }
 
 void Koostamine_Vormista(SessionState& state, web::Call& call) {

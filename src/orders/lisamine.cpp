@@ -5,7 +5,9 @@
 #include "base/runtime_error.h"
 #include "base/text.h"
 #include "host/errors.h"
+#include "orders/basket_rows.h"
 #include "orders/header_fields.h"
+#include "orders/permission.h"
 #include "tags/field_text.h"
 #include "tags/fixed_tax.h"
 #include "tags/page_tags.h"
@@ -19,7 +21,8 @@ using tags::TagCall;
 constexpr std::string_view kFixed[] = {"Price"};
 
 double TaxFactor(data::Record& row) {
-    return 1 + row.GetField("GRArticle.GRTax.TaxPercent").ToDouble() / 100;
+    const base::Value percent = row.GetField("GRArticle.GRTax.TaxPercent");
+    return percent.IsBlank() ? 1 : 1 + percent.ToDouble() / 100;
 }
 
 bool LisaRida(TagCall& c) {
@@ -39,7 +42,8 @@ bool LisaRida(TagCall& c) {
 double TypedQuantity(const web::Call& call) {
     const std::string typed = tags::CleanFormValue(call.request.Form["ZEBInQuant"]);
     const double quantity = base::Value(base::Replaced(typed, " ", "")).ToDouble();
-    if (typed.empty() || quantity <= 0) throw base::RuntimeError(base::errors::kTypeMismatch);
+    const bool is_fit = quantity > 0 && quantity <= kMostQuantity;
+    if (typed.empty() || !is_fit) throw base::RuntimeError(base::errors::kTypeMismatch);
     return quantity;
 }
 
@@ -76,6 +80,7 @@ void Lisamine_UserEvent(SessionState& state, web::Call& call, std::string_view e
     if (!host::CheckLogon(state, call)) return;
     host::Guarded(state, "Lisamine_UserEvent", [&] {
         if (!base::StartsWithNoCase(event, "ID_")) return;
+        state.basket_form.RowToAdd.reset();
         const auto& list = state.catalogue.ListQuery;
         if (!list) throw base::RuntimeError(base::errors::kObjectNotSet);
         state.basket_form.RowToAdd = list->Find("ID=" + std::string(event.substr(3)));
@@ -86,6 +91,7 @@ void Lisamine_UserEvent(SessionState& state, web::Call& call, std::string_view e
 void Lisamine_Lisamine(SessionState& state, web::Call& call) {
     if (!host::CheckLogon(state, call)) return;
     const auto work = [&] {
+        if (RefusesOrders(state, call)) return call.RedirectTo("Lisamine");
         AddRow(state, call);
         call.RedirectTo("Lisatud");
     };

@@ -1,8 +1,11 @@
 #include "base/ignore_errors.h"
 #include "base/text.h"
 #include "host/errors.h"
+#include "orders/first_error.h"
 #include "orders/header_fields.h"
 #include "orders/kinnitus.h"
+#include "orders/permission.h"
+#include "orders/saving_problem.h"
 #include "tags/custom_func.h"
 #include "tags/order_view.h"
 
@@ -27,37 +30,45 @@ bool ReturnsToCatalogue(const SessionState& state) {
 // Back to the catalogue; what was typed stays with the basket.
 void GoBack(SessionState& state, web::Call& call) {
     if (data::Document* basket = state.basket.Basket.get()) {
-        SetHeaderFields(state, call.request);
+        FirstError refusal;
+        refusal.Try([&] { SetHeaderFields(state, call.request); });
         const std::string comment = Posted(call, "ZEB_Komment");
         const base::Value old = basket->GetField("Explanation");
         if (!base::EqualNoCase(old.IsBlank() ? "" : old.ToPlainText(), comment)) {
-            basket->SetField("Explanation", comment);
+            refusal.Try([&] { basket->SetField("Explanation", comment); });
         }
+        refusal.Rethrow();
     }
     call.RedirectTo("Kaubainfo");
 }
 
+// Whatever can be taken is taken, so that a form shown again holds what was typed.
 void FillHeader(SessionState& state, const web::Call& call) {
-    data::Document& basket = *state.basket.Basket;
-    SetHeaderFields(state, call.request);
+    FirstError refusal;
+    const auto set = [&](std::string_view field, const base::Value& value) {
+        refusal.Try([&] { state.basket.Basket->SetField(field, value); });
+    };
+    refusal.Try([&] { SetHeaderFields(state, call.request); });
     const std::string name = Posted(call, "ZEB_Nimi");
-    if (!name.empty()) basket.SetField("CompanyName", name);
+    if (!name.empty()) set("CompanyName", name);
     const std::string address = Posted(call, "ZEB_Aadress");
-    if (!address.empty()) basket.SetField("CompanyAddr", address);
-    basket.SetField("Explanation", Posted(call, "ZEB_Komment"));
-    if (state.company.ContactLoaded) {
-        basket.SetField("IDGRCompContPerson", state.company.IDContactPerson);
-    }
+    if (!address.empty()) set("CompanyAddr", address);
+    set("Explanation", Posted(call, "ZEB_Komment"));
+    if (state.company.ContactLoaded) set("IDGRCompContPerson", state.company.IDContactPerson);
+    refusal.Rethrow();
 }
 
 void Store(SessionState& state, web::Call& call) {
+    if (RefusesOrders(state, call)) return call.RedirectTo("Kinnitus");
     FillHeader(state, call);
     state.basket.Basket->Save();
     state.confirmation.ShownOrderFilter = "ID_" + state.basket.Basket->GetField("ID").ToPlainText();
     data::DiscardBasket(state.basket);
     state.confirmation.OrderJustSaved = true;
-    data::LoadShownOrder(
-        state.application(), state.confirmation.ShownOrderFilter, state.documents.ShownOrder);
+    // The order stands, whether it can be read at once or not: the page that shows it reads it
+    // then.
+    state.documents.ShownOrder = {};
+    host::Guarded(state, "Kinnitus_LisaTellimus", [&] { tags::ReadShownOrder(state); });
     call.RedirectTo(Pressed(call, "ZEB_But_Vormista") ? "Tellimus" : "Kinnitatud");
 }
 
@@ -93,12 +104,19 @@ void PressButton(SessionState& state, web::Call& call) {
 
 void Kinnitus_LisaTellimus(SessionState& state, web::Call& call) {
     if (!host::CheckLogon(state, call)) return;
-    const auto failed = [&] {
-        state.Message = "Probleem tellimuse salvestamisel!";
-        call.RedirectTo("Kinnitus");
+    std::string problem;
+    const auto work = [&] {
+        try {
+            PressButton(state, call);
+        } catch (const std::exception& error) {
+            problem = SavingProblem(error, state.settings()->language());
+            throw;
+        }
     };
-    host::Guarded(
-        state, "Kinnitus_LisaTellimus", [&] { PressButton(state, call); }, failed);
+    host::Guarded(state, "Kinnitus_LisaTellimus", work, [&] {
+        state.Message = problem;
+        call.RedirectTo("Kinnitus");
+    });
 }
 
 }  // namespace zebtell::orders

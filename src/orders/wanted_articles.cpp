@@ -112,9 +112,10 @@ void FindCodes(SessionState& state, std::vector<Wish>& wishes) {
         "");
     std::unordered_map<std::string, std::shared_ptr<Record>, base::NoCaseHash, base::NoCaseEqual>
         by_code;
-    for (std::int64_t i = 1; i <= rows->Count(); ++i) {
-        const auto row = rows->Item(i);
-        for (const char* field : {"GRArticle.Code", "GRArticle.Barcode"}) {
+    // An article's own code comes before the same text as another's barcode.
+    for (const char* field : {"GRArticle.Code", "GRArticle.Barcode"}) {
+        for (std::int64_t i = 1; i <= rows->Count(); ++i) {
+            const auto row = rows->Item(i);
             by_code.emplace(row->GetField(field).ToPlainText(), row);
         }
     }

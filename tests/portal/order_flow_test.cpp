@@ -248,7 +248,8 @@ TEST_F(OrderFlow, StoredOrdersAreOpenedCopiedAndGuarded) {
     // Staff have begun with this one: refused, and the basket is intact.
     mari.Get("Kinnitus&event=ID_503");
     EXPECT_THAT(mari.Post("Kinnitus&event=LisaTellimus", {{"ZEB_But_Vormista", "1"}}),
-                HasSubstr("[koost2 (Probleem tellimuse salvestamisel!) sum="));
+                HasSubstr("[koost2 (Probleem tellimuse salvestamisel! Tellimust juba täidetakse, "
+                          "seda ei saa enam muuta.) sum="));
     EXPECT_THAT(mari.page(), HasSubstr("(KR-1|1,00|"));
     EXPECT_EQ(company().Run("SELECT Explanation FROM SDOrder WHERE ID = 503"), "töös\n");
 
