@@ -82,6 +82,25 @@ void OpenNewList(benchmark::State& state) {
 }
 BENCHMARK(OpenNewList)->ArgName("by code")->Arg(0)->Arg(1)->Unit(benchmark::kMillisecond);
 
+// The whole price list as the catalogue asks for it, and searches with few hits; never the same.
+void OpenNewSearch(benchmark::State& state) {
+    const auto portal = LogOn();
+    const bool searches = state.range(0) != 0;
+    int number = 0;
+    std::int64_t rows = 0;
+    for (auto _ : state) {
+        const std::string text = searches ? "m" + std::to_string(++number) : "";
+        const std::string filter =
+            "{GRPriceListRel.Price<>0 AND GRPriceListRel.ID IN (select P5.ID from SQPriceList5 P5 "
+            "inner join GRArticle on P5.IDGRArticle=GRArticle.ID where (GRArticle.name LIKE '*" +
+            text + "*' OR GRArticle.code LIKE '" + text + "*') AND (IDGRPriceList=1 or " +
+            std::to_string(++number) + "=0))}";
+        rows = portal->OpenList("GRPriceListRel", filter, "GRArticle.Code")->Count();
+    }
+    state.counters["rows"] = static_cast<double>(rows);
+}
+BENCHMARK(OpenNewSearch)->ArgName("words")->Arg(0)->Arg(1)->Unit(benchmark::kMillisecond);
+
 void OpenKnownList(benchmark::State& state) {
     const auto portal = LogOn();
     OpenCatalogue(*portal, 0);

@@ -1,21 +1,55 @@
 #include "erp/field_set.h"
 
+#include <bit>
+
 namespace zebtell::erp {
 namespace {
 
 constexpr std::size_t kMostFields = 100;
 
+// The same for a small and a capital letter, and for all bytes of letters beyond ASCII.
+std::size_t CaselessByte(char c) {
+    const auto byte = static_cast<unsigned char>(c);
+    return byte < 0x80 ? byte | 0x20U : 0x80U;
+}
+
+// Of the length and some letters: names of columns differ early, and paths differ in their end.
+std::size_t HashOf(std::string_view name) {
+    std::size_t hash = name.size();
+    for (std::size_t i = 0; i < name.size(); i += 1 + i / 4) {
+        hash = hash * 31 + CaselessByte(name[name.size() - 1 - i]);
+    }
+    return hash;
+}
+
 }  // namespace
 
-FieldSet::FieldSet(std::vector<std::string> names) : names_(std::move(names)) {
+FieldSet::FieldSet(std::vector<std::string> names)
+    : names_(std::move(names)), places_(std::bit_ceil(4 * names_.size() + 1)) {
     for (std::size_t i = 0; i < names_.size(); ++i) {
-        by_name_.try_emplace(names_[i], i);
+        std::uint32_t& place = places_[PlaceOf(names_[i])];
+        if (place == 0) {
+            place = static_cast<std::uint32_t>(i + 1);
+        }
     }
 }
 
 std::optional<std::size_t> FieldSet::Find(std::string_view name) const {
-    const auto found = by_name_.find(name);
-    return found == by_name_.end() ? std::nullopt : std::optional(found->second);
+    const std::uint32_t place = places_[PlaceOf(name)];
+    return place == 0 ? std::nullopt : std::optional<std::size_t>(place - 1);
+}
+
+// Where the name is, or the free place where it would be.
+std::size_t FieldSet::PlaceOf(std::string_view name) const {
+    std::size_t place = HashOf(name) & (places_.size() - 1);
+    while (places_[place] != 0) {
+        const std::string& known = names_[places_[place] - 1];
+        if (known == name || base::EqualNoCase(known, name)) {
+            break;
+        }
+        place = (place + 1) & (places_.size() - 1);
+    }
+    return place;
 }
 
 std::shared_ptr<const FieldSet> LearnedFields::Known(const std::string& table) const {

@@ -57,6 +57,18 @@ KeyTable::KeyTable(std::int64_t id) : KeyTable() {
     columns_[0]->keys.Append(id);
 }
 
+KeyTable::KeyTable(const KeyTable& from, std::span<const std::uint32_t> rows) {
+    for (const auto& column : from.columns_) {
+        columns_.push_back(std::make_unique<KeyColumn>());
+        columns_.back()->name = column->name;
+        CompactKeys& keys = columns_.back()->keys;
+        keys.Reserve(rows.size());
+        for (const std::uint32_t row : rows) {
+            keys.Append(column->keys[row]);
+        }
+    }
+}
+
 KeyTable::KeyTable(Cursor& cursor, const std::vector<std::string>& columns) : KeyTable(columns) {
     while (cursor.Next()) {
         if (count() == kMostRows) {

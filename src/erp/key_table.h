@@ -4,6 +4,7 @@
 #include <memory>
 #include <mutex>
 #include <optional>
+#include <span>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -17,6 +18,7 @@ namespace zebtell::erp {
 class CompactKeys {
   public:
     void Append(std::int64_t key);
+    void Reserve(std::size_t count) { narrow_.reserve(count); }
     std::int64_t operator[](std::size_t i) const {
         return wide_.empty() ? std::int64_t{narrow_[i]} : wide_[i];
     }
@@ -38,6 +40,8 @@ class KeyTable : public Result {
     KeyTable(Cursor& cursor, const std::vector<std::string>& columns);
     KeyTable() : KeyTable(std::vector<std::string>()) {}  // no rows
     explicit KeyTable(std::int64_t id);                   // one row
+    // The rows of another table in another order.
+    KeyTable(const KeyTable& from, std::span<const std::uint32_t> rows);
 
     std::size_t Bytes() const override;
 

@@ -8,6 +8,7 @@ namespace zebtell::erp {
 namespace {
 
 constexpr std::size_t kMostQueryRows = 50'000;
+constexpr std::size_t kFewRows = 1'000;
 
 std::shared_ptr<RowSet> ReadAll(Cursor& cursor, std::shared_ptr<const FieldSet> fields) {
     auto rows = std::make_shared<RowSet>(std::move(fields));
@@ -98,18 +99,45 @@ std::shared_ptr<const KeyTable> Session::Keys(const TableInfo& table,
     LearnedFields& learned = database_->find_columns();
     const std::string key = TableKey(table);
     const auto known = learned.Of(key, [] { return std::vector<std::string>(); });
-    const auto fields = With(known, find_column);
+    const auto linked = FindLinkedOrder(schema(), table, order);
+    auto fields = With(known, find_column);
+    if (linked) {
+        fields = With(std::move(fields), linked->link->name);
+    }
     const std::vector<std::string> columns(Selected(*fields).begin(), Selected(*fields).end());
     const BoundSql sql =
-        database_->translator().ListKeys(reader_, table.name, filter, order, columns);
-    auto keys = Shared<KeyTable>(ResultKey('k', sql), [&] {
-        return Run(
-            sql, [&](Cursor& cursor) { return std::make_shared<const KeyTable>(cursor, columns); });
+        database_->translator().ListKeys(reader_, table.name, filter, linked ? "" : order, columns);
+    const std::string by_link = linked ? "by " + linked->link->name + " " + linked->order : "";
+    auto keys = Shared<KeyTable>(ResultKey('k', sql) + by_link, [&] {
+        auto read = ReadKeys(sql, columns);
+        return linked ? InOrder(std::move(read), *linked) : read;
     });
     if (fields != known) {
         learned.Learn(key, fields);
     }
     return keys;
+}
+
+std::shared_ptr<const KeyTable> Session::ReadKeys(const BoundSql& sql,
+                                                  const std::vector<std::string>& columns) {
+    return Run(sql,
+               [&](Cursor& cursor) { return std::make_shared<const KeyTable>(cursor, columns); });
+}
+
+// The order of all linked records is read once for all lists; for a short list that of its own.
+std::shared_ptr<const KeyTable> Session::InOrder(std::shared_ptr<const KeyTable> keys,
+                                                 const LinkedOrder& order) {
+    const std::size_t link = *keys->ColumnOf(order.link->name);
+    std::string filter;
+    if (keys->count() <= kFewRows) {
+        filter = "ID in (0";
+        for (std::size_t row = 0; row < keys->count(); ++row) {
+            filter += "," + std::to_string(keys->Get(row, link));
+        }
+        filter += ")";
+    }
+    const auto linked = Keys(*order.target, filter, order.order);
+    return ArrangedByLink(*keys, link, *linked, order.descending);
 }
 
 std::shared_ptr<const RowSet> Session::Rows(const TableInfo& table,

@@ -11,6 +11,7 @@
 #include "erp/access.h"
 #include "erp/company_database.h"
 #include "erp/key_table.h"
+#include "erp/linked_order.h"
 #include "erp/row_set.h"
 
 namespace zebtell::erp {
@@ -46,6 +47,10 @@ class Session {
     std::shared_ptr<const RowSet> Query(std::string_view sql);
 
   private:
+    std::shared_ptr<const KeyTable> ReadKeys(const BoundSql& sql,
+                                             const std::vector<std::string>& columns);
+    std::shared_ptr<const KeyTable> InOrder(std::shared_ptr<const KeyTable> keys,
+                                            const LinkedOrder& order);
     template <class Kept, class Read>
     std::shared_ptr<const Kept> Shared(const std::string& key, Read&& read);
     template <class Read>

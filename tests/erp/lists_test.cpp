@@ -27,8 +27,12 @@ INSTANTIATE_TEST_SUITE_P(Databases,
 TEST_P(ListsTest, AListIsOneStatementAndAPageOneMore) {
     const auto portal = LogOn();
     watch_->Start();
-    const auto list = portal->OpenList("GRPriceListRel", "", "GRArticle.Code");
+    portal->OpenList("GRPriceListRel", "", "Price");
     EXPECT_EQ(watch_->statements(), 1);
+    // The order of the linked records is a statement of its own.
+    watch_->Start();
+    const auto list = portal->OpenList("GRPriceListRel", "", "GRArticle.Code");
+    EXPECT_EQ(watch_->statements(), 2);
     EXPECT_EQ(list->Count(), 45);
     // The first reader of a path has its window read again; everybody after reads it at once.
     EXPECT_EQ(Page(*list, 1, 2), "A001=1 A002=2 2");
@@ -38,6 +42,34 @@ TEST_P(ListsTest, AListIsOneStatementAndAPageOneMore) {
     EXPECT_EQ(Page(*list, 19, 20), "A019=19 A020=20 1");
     EXPECT_EQ(ErrorOf([&] { list->Item(0); }), base::errors::kSubscript);
     EXPECT_EQ(ErrorOf([&] { list->Item(46); }), base::errors::kSubscript);
+}
+
+TEST_P(ListsTest, RowsStandInTheOrderOfTheirLinkedRecords) {
+    const auto portal = LogOn();
+    const auto ids = [&](const char* table, const char* filter, const char* order) {
+        const auto list = portal->OpenList(table, filter, order);
+        std::string text;
+        for (std::int64_t i = 1; i <= list->Count(); ++i) {
+            text += Text(*list->Item(i), "ID") + " ";
+        }
+        return text;
+    };
+    company_->Run("update GRArticle set Name = 'A' where ID = 4");
+    company_->Run("update GRArticle set Name = 'B' where ID in (1, 3)");
+    company_->Run("update GRArticle set Name = 'C', IDGRTax = 2 where ID = 2");
+    const char* four = "IDGRArticle in (1, 2, 3, 4)";
+    EXPECT_EQ(ids("GRPriceListRel", four, "GRArticle.Name"), "104 101 103 102 ");
+    EXPECT_EQ(ids("GRPriceListRel", four, "grarticle.name desc"), "102 101 103 104 ");
+    EXPECT_EQ(ids("GRPriceListRel", "ID = 0", "GRArticle.Name"), "");
+    // Records that several rows link to, and rows that link to none.
+    EXPECT_EQ(ids("GRArticle", "ID in (1, 2, 3)", "GRTax.TaxPercent"),
+              ids("GRArticle", "ID in (1, 2, 3)", "GRTax.TaxPercent, ID"));
+    company_->Run("update GRArticle set IDGRArticlePriceCat = null where ID = 2");
+    for (const char* order : {"GRArticlePriceCat.Name", "GRArticlePriceCat.Name desc"}) {
+        EXPECT_EQ(ids("GRArticle", "ID < 9", order),
+                  ids("GRArticle", "ID < 9", (order + std::string(", ID")).c_str()))
+            << order;
+    }
 }
 
 TEST_P(ListsTest, AWholeWalkTakesFewStatements) {
