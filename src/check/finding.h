@@ -1,9 +1,9 @@
 #pragma once
 
-#include <compare>
 #include <cstddef>
 #include <ostream>
 #include <string>
+#include <tuple>
 
 namespace zebtell::check {
 
@@ -13,7 +13,9 @@ struct Finding {
     std::size_t line = 0;  // 0: none in particular
     std::string text;
 
-    friend auto operator<=>(const Finding&, const Finding&) = default;
+    friend bool operator<(const Finding& a, const Finding& b) {
+        return std::tie(a.file, a.line, a.text) < std::tie(b.file, b.line, b.text);
+    }
 };
 
 // "zebtell_kaubad.htm:37: unknown tag ZEB:HKRidda"
