@@ -130,16 +130,14 @@ bool PriceFieldTag(TagCall& c) {
 
 bool Company(TagCall& c) {
     if (!c.state.company.PartnerRecord) return NoOutput(c);
-    const auto settings = c.state.settings();
     c.tag.Write(tags::FormatFieldValue(
-        *c.state.company.PartnerRecord, "Partner." + Cleaned(c), "", settings->region()));
+        *c.state.company.PartnerRecord, "Partner." + Cleaned(c), "", c.state.region()));
     return true;
 }
 
 bool DiscountPercent(TagCall& c) {
-    const auto settings = c.state.settings();
     const double percent = base::Rounded((1 - c.state.company.PriceFactor) * 100, 1);
-    c.tag.Write(base::Value(percent).ToText(settings->region()));
+    c.tag.Write(base::Value(percent).ToText(c.state.region()));
     return true;
 }
 

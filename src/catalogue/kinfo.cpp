@@ -23,12 +23,11 @@ std::shared_ptr<data::Record> ReadArticle(SessionState& state, const std::string
 
 bool Article(tags::TagCall& c) {
     data::Record* article = c.state.documents.Article.get();
-    const auto settings = c.state.settings();
     c.tag.Write(
         article == nullptr
             ? "&nbsp;"
             : tags::FormatFieldValue(
-                  *article, tags::CleanFormValue(c.tag.TagContents()), "", settings->region()));
+                  *article, tags::CleanFormValue(c.tag.TagContents()), "", c.state.region()));
     return true;
 }
 

@@ -20,8 +20,7 @@ std::string FinalPrice18(data::Record& prices, const base::Region& region) {
 std::string RowField(const host::SessionState& state, std::string_view field) {
     const host::CatalogueState& catalogue = state.catalogue;
     if (!catalogue.CurrentRow) return {};
-    const auto settings = state.settings();
-    const base::Region& region = settings->region();
+    const base::Region& region = state.region();
     data::Record& row = *catalogue.CurrentRow;
     if (base::EqualNoCase(field, "Price18")) {
         return tags::FixedPrice(row.GetField("Price"), tags::kTax18, region);
@@ -42,12 +41,11 @@ std::string RowField(const host::SessionState& state, std::string_view field) {
 
 std::string PriceField(const host::SessionState& state, std::string_view field) {
     if (!state.catalogue.PriceRow) return {};
-    const auto settings = state.settings();
     data::Record& prices = *state.catalogue.PriceRow;
     if (base::EqualNoCase(field, "FinalPrice18")) {
-        return FinalPrice18(prices, settings->region());
+        return FinalPrice18(prices, state.region());
     }
-    return tags::FormatFieldValue(prices, field, "", settings->region());
+    return tags::FormatFieldValue(prices, field, "", state.region());
 }
 
 }  // namespace zebtell::catalogue

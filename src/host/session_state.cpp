@@ -7,6 +7,11 @@
 
 namespace zebtell::host {
 
+void SessionState::LookAtSettings() {
+    settings_ = services.settings.Current();
+    region_ = &settings_->region();
+}
+
 data::DataApplication& SessionState::application() const {
     if (!logon.Application) throw base::RuntimeError(base::errors::kObjectNotSet);
     return *logon.Application;

@@ -22,7 +22,7 @@ namespace zebtell::host {
 // Everything that belongs to one browser session. One request of a session runs at a time, so
 // nothing here is locked.
 struct SessionState {
-    explicit SessionState(Services& services) : services(services) {}
+    explicit SessionState(Services& services) : services(services) { LookAtSettings(); }
     SessionState(const SessionState&) = delete;
     SessionState& operator=(const SessionState&) = delete;
 
@@ -43,9 +43,16 @@ struct SessionState {
     std::unique_ptr<NoCaseMap<std::string>> session_dictionary;
     bool initialised = false;
 
-    std::shared_ptr<const Settings> settings() const { return services.settings.Current(); }
+    // The settings as they were when the request began; hundreds of tags of a page ask for them.
+    const Settings* settings() const { return settings_.get(); }
+    const base::Region& region() const { return *region_; }
+    void LookAtSettings();
     // RuntimeError 91 when nobody is logged on.
     data::DataApplication& application() const;
+
+  private:
+    std::shared_ptr<const Settings> settings_;
+    const base::Region* region_ = nullptr;
 };
 
 using Page = web::Page<SessionState>;

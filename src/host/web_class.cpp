@@ -24,12 +24,14 @@ void WebClass_Initialize(SessionState& state) {
     });
     base::IgnoreErrors([&] { state.templates.PriceQueryText = data::DefaultPriceQueryText(); });
     base::IgnoreErrors([&] { state.services.settings.Load(); });
+    state.LookAtSettings();
     state.initialised = true;
     base::IgnoreErrors([&] { WriteLog(state, "++ZEBTell+initialized++", log_Normal); });
 }
 
 void WebClass_BeginRequest(SessionState& state, web::Call& call) {
     base::IgnoreErrors([&] {
+        state.LookAtSettings();
         state.SessionID = call.SessionID();
         WriteLog(state, "+Req+beg+ " + call.request.ServerVariables("QUERY_STRING"), log_Debug);
     });

@@ -8,7 +8,7 @@
 namespace zebtell::tags {
 
 const base::Region& RegionOf(const host::SessionState& state) {
-    return state.settings()->region();
+    return state.region();
 }
 
 std::string Reference(const TagCall& call) {
