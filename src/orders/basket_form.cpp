@@ -75,7 +75,8 @@ void ChangeRowTexts(SessionState& state, const web::Call& call, Record& row, std
     const std::string number = std::to_string(n);
     bool changed = false;
     for (const std::string& field : state.basket_form.EditableRowFields) {
-        const std::string box = "EF_" + field + "_" + number;
+        std::string box = "EF_";
+        box.append(field).append("_").append(number);
         if (!call.request.Form.Has(box)) continue;
         base::IgnoreErrors([&] {
             changed |= ChangeExtraField(row, field, Posted(call, box), settings->region());

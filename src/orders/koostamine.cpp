@@ -92,8 +92,10 @@ void Koostamine_UserEvent(SessionState& state, web::Call& call, std::string_view
     host::Guarded(state, "Koostamine_UserEvent", [&] {
         if (base::StartsWithNoCase(event, "DEL_")) DeleteRow(state, event.substr(4));
     });
+    const bool to_catalogue = base::EqualNoCase(call.request.Value("Next"), "Kaubainfo");
+    if (to_catalogue) state.catalogue.ListFresh = true;  // at the page that was shown
     // By a redirect: the page loaded again must not take out one row more.
-    call.RedirectTo("Koostamine");
+    call.RedirectTo(to_catalogue ? "Kaubainfo" : "Koostamine");
 }
 
 void Koostamine_Vormista(SessionState& state, web::Call& call) {

@@ -15,13 +15,15 @@ using base::Currency;
 using data::Record;
 using host::SessionState;
 
-std::string Joined(const std::vector<std::string>& items) {
-    std::string text;
-    for (const std::string& item : items) {
-        if (!text.empty()) text += ',';
-        text += item;
+// What `text` says of each item, separated by commas.
+template <class Items, class Text>
+std::string Joined(const Items& items, Text&& text) {
+    std::string joined;
+    for (const auto& item : items) {
+        if (!joined.empty()) joined += ',';
+        joined += text(item);
     }
-    return text;
+    return joined;
 }
 
 std::string Quoted(std::string_view text) {
@@ -89,10 +91,8 @@ void TakeRow(Wish& wish, Record& row) {
 
 void FindRows(SessionState& state, std::vector<Wish>& wishes) {
     if (wishes.empty()) return;
-    std::vector<std::string> ids;
-    for (const Wish& wish : wishes) ids.push_back(wish.row_id);
-    const auto rows =
-        state.application().OpenList("GRPriceListRel", "ID in (" + Joined(ids) + ")", "");
+    const std::string ids = Joined(wishes, [](const Wish& wish) { return wish.row_id; });
+    const auto rows = state.application().OpenList("GRPriceListRel", "ID in (" + ids + ")", "");
     for (Wish& wish : wishes) {
         if (const auto row = rows->Find("ID=" + wish.row_id)) TakeRow(wish, *row);
     }
@@ -100,9 +100,8 @@ void FindRows(SessionState& state, std::vector<Wish>& wishes) {
 
 void FindCodes(SessionState& state, std::vector<Wish>& wishes) {
     if (wishes.empty()) return;
-    std::vector<std::string> codes;
-    for (const Wish& wish : wishes) codes.push_back(Quoted(wish.wanted.name));
-    const std::string list = Joined(codes);
+    const std::string list =
+        Joined(wishes, [](const Wish& wish) { return Quoted(wish.wanted.name); });
     const auto rows = state.application().OpenList(
         "GRPriceListRel",
         "{GRPriceListRel.ID in (select P5.ID from SQPriceList5 P5 inner join GRArticle on "
@@ -127,16 +126,16 @@ void FindCodes(SessionState& state, std::vector<Wish>& wishes) {
 
 // The customer's own price of each article that no price was asked for.
 void TakePrices(SessionState& state, std::vector<WantedArticle>& wanted) {
-    std::vector<std::string> articles;
-    for (const WantedArticle& each : wanted) articles.push_back(std::to_string(each.article));
-    if (articles.empty()) return;
+    if (wanted.empty()) return;
+    const std::string articles =
+        Joined(wanted, [](const WantedArticle& each) { return std::to_string(each.article); });
     const std::int32_t customer = state.company.CustomerKey;
     const auto prices =
         state.application().OpenQuery(tags::BuildPriceQuery(state.templates.PriceQueryText,
                                                             customer,
                                                             customer,
                                                             state.company.PriceListId,
-                                                            Joined(articles)),
+                                                            articles),
                                       0,
                                       0);
     for (WantedArticle& each : wanted) {

@@ -171,7 +171,9 @@ visit('a buyer orders', async (visitor, step) => {
 
   await step('a row is taken out', async () => {
     await visitor.follow(visitor.basket().getByRole('link', { name: /^Eemalda/ }).nth(2));
-    assert.equal(await visitor.heading(), 'Korv');
+    assert.equal(await visitor.heading(), 'Kaubad');
+    assert.equal((await visitor.basketSums()).length, 2);
+    await visitor.go('page=Koostamine');
     assert.deepEqual(
       (await visitor.rows()).map((row) => row.code),
       chosen.map((row) => row.code),
@@ -186,6 +188,21 @@ visit('a buyer orders', async (visitor, step) => {
       await visitor.photograph(name.toLowerCase());
     }
     await visitor.openCatalogue();
+  });
+
+  await step('going on takes quantities along that were only typed', async () => {
+    const quantity = visitor.basket().getByLabel('Kogus').first();
+    await quantity.fill('6');
+    await visitor.press('Vormista');
+    assert.equal((await visitor.rows())[0].Kogus, '6');
+    await visitor.press('Tagasi');
+    await quantity.fill('5');
+  });
+
+  await step('the basket can be confirmed without scrolling to its end', async () => {
+    await page.setViewportSize({ width: 1280, height: 720 });
+    const box = await page.getByRole('button', { name: 'Vormista' }).boundingBox();
+    assert.ok(box.y + box.height <= 720, `the button ends at ${box.y + box.height}`);
   });
 
   await step('going back from the confirmation keeps what was typed', async () => {

@@ -3,6 +3,7 @@
 namespace zebtell {
 namespace {
 
+using ::testing::AllOf;
 using ::testing::HasSubstr;
 using ::testing::Not;
 
@@ -127,6 +128,13 @@ TEST_F(OrderRules, RowsAreTakenOutOnceAndLeaveTheTotals) {
     const auto answer = mari.Ask("/?page=Koostamine&event=DEL_1", "GET", "");
     EXPECT_EQ(answer.status, 303);
     EXPECT_EQ(answer.Header("Location"), "/?page=Koostamine");
+    // A link in the catalogue leads back to the page of the list that was shown, and nowhere else.
+    mari.Post("Kaubainfo&event=Hinnakiri", {{"ZEBInText", ""}, {"Combo_GRArticleCat", "0"}});
+    mari.Get("Kaubainfo&event=NextPage");
+    mari.Post("Kaubainfo&event=Lisamine", {{"ID_1101", "1"}});
+    EXPECT_THAT(mari.Get("Koostamine&event=DEL_2&Next=kaubainfo"),
+                AllOf(HasSubstr("[kaubad  rows=48 page=2/3"), HasSubstr("[basket rows=1 ")));
+    EXPECT_THAT(mari.Get("Koostamine&event=DEL_9&Next=http://x"), HasSubstr("[koost1 "));
     EXPECT_THAT(mari.Get("Kaubainfo"), HasSubstr("[basket rows=1 quantity=10 total=3,30]"));
 
     // A row whose adding failed was never counted.
