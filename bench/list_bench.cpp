@@ -91,10 +91,10 @@ void OpenNewSearch(benchmark::State& state) {
     for (auto _ : state) {
         const std::string text = searches ? "m" + std::to_string(++number) : "";
         const std::string filter =
-            "{GRPriceListRel.Price<>0 AND GRPriceListRel.ID IN (select P5.ID from SQPriceList5 P5 "
-            "inner join GRArticle on P5.IDGRArticle=GRArticle.ID where (GRArticle.name LIKE '*" +
-            text + "*' OR GRArticle.code LIKE '" + text + "*') AND (IDGRPriceList=1 or " +
-            std::to_string(++number) + "=0))}";
+            "{GRPriceListRel.Price<>-" + std::to_string(++number) +
+            " AND GRPriceListRel.ID IN (select P5.ID from SQPriceList5 P5 inner join GRArticle on "
+            "P5.IDGRArticle=GRArticle.ID where (GRArticle.name LIKE '*" +
+            text + "*' OR GRArticle.code LIKE '" + text + "*') AND (IDGRPriceList=1))}";
         rows = portal->OpenList("GRPriceListRel", filter, "GRArticle.Code")->Count();
     }
     state.counters["rows"] = static_cast<double>(rows);

@@ -8,6 +8,8 @@ namespace zebtell::erp::sqlite {
 namespace {
 
 constexpr int kStepsBetweenLooks = 2000;  // some 50 us of a statement's work
+// Room for the articles and price lines that every search walks through.
+constexpr const char* kReadingCache = "PRAGMA cache_size = -32000";
 
 }  // namespace
 
@@ -70,6 +72,7 @@ void SqliteConnection::SetUp(Access access) {
     Run("PRAGMA temp_store = MEMORY");
     if (access == Access::kRead) {
         Run("PRAGMA query_only = ON");
+        Run(kReadingCache);
         sqlite3_progress_handler(database_, kStepsBetweenLooks, OutOfTime, this);
     }
 }

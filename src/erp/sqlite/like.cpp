@@ -1,6 +1,7 @@
 #include "erp/sqlite/like.h"
 
 #include <algorithm>
+#include <array>
 #include <cstring>
 
 #include "base/text.h"
@@ -11,22 +12,43 @@ namespace {
 constexpr char kAnyRun = static_cast<char>(0xFF);
 constexpr char kAnyOne = static_cast<char>(0xFE);
 
-bool IsAscii(std::string_view text) {
-    return std::all_of(
-        text.begin(), text.end(), [](char c) { return static_cast<unsigned char>(c) < 0x80; });
+constexpr std::array<char, 256> MakeLowerBytes() {
+    std::array<char, 256> bytes{};
+    for (int i = 0; i < 256; ++i) {
+        bytes[i] = static_cast<char>(i >= 'A' && i <= 'Z' ? i - 'A' + 'a' : i);
+    }
+    return bytes;
 }
 
-// The folded text, in a buffer that lives until the thread's next call.
+constexpr auto kLowerBytes = MakeLowerBytes();
+
+// Folds the letters beyond ASCII; none changes its length.
+void FoldLetters(std::string_view text, std::string& buffer) {
+    const auto is_ascii = [](char c) { return static_cast<unsigned char>(c) < 0x80; };
+    const auto end = text.end();
+    for (auto at = text.begin(); at != end;) {
+        const auto start = std::find_if_not(at, end, is_ascii);
+        at = std::find_if(start, end, is_ascii);
+        const std::string lower = base::Lower(std::string_view(start, at));
+        lower.copy(buffer.data() + (start - text.begin()), lower.size());
+    }
+}
+
+// The folded text, in a buffer that lives until the thread's next call. A search folds the names
+// of all articles.
 std::string_view Folded(std::string_view text) {
     thread_local std::string buffer;
-    if (!IsAscii(text)) {
-        buffer = base::Lower(text);
-        return buffer;
-    }
     buffer.resize(text.size());
-    std::transform(text.begin(), text.end(), buffer.begin(), [](char c) {
-        return c >= 'A' && c <= 'Z' ? static_cast<char>(c + ('a' - 'A')) : c;
-    });
+    char* out = buffer.data();
+    unsigned char all = 0;
+    for (const char c : text) {
+        const auto byte = static_cast<unsigned char>(c);
+        all |= byte;
+        *out++ = kLowerBytes[byte];
+    }
+    if (all >= 0x80) {
+        FoldLetters(text, buffer);
+    }
     return buffer;
 }
 
