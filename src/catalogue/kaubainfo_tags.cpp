@@ -7,16 +7,13 @@
 #include "catalogue/row_prices.h"
 #include "markup/escape.h"
 #include "tags/custom_func.h"
+#include "tags/field_text.h"
 
 namespace zebtell::catalogue {
 namespace {
 
 using host::CatalogueState;
 using tags::TagCall;
-
-std::string Cleaned(const TagCall& c) {
-    return tags::CleanFormValue(c.tag.TagContents());
-}
 
 CatalogueState& Catalogue(TagCall& c) {
     return c.state.catalogue;
@@ -25,7 +22,7 @@ CatalogueState& Catalogue(TagCall& c) {
 // A tag that only declares a value of the page.
 template <std::string CatalogueState::*Text>
 bool Declare(TagCall& c) {
-    Catalogue(c).*Text = Cleaned(c);
+    Catalogue(c).*Text = tags::Reference(c);
     c.tag.Hide();
     return true;
 }
@@ -69,7 +66,7 @@ bool GrupidOfGroup(TagCall& c) {
 
 bool GruppQuery(TagCall& c) {
     Catalogue(c).GroupQueryText =
-        base::Replaced(Cleaned(c), "#F", std::to_string(c.state.company.CustomerKey));
+        base::Replaced(tags::Reference(c), "#F", std::to_string(c.state.company.CustomerKey));
     c.tag.Hide();
     return true;
 }
@@ -119,19 +116,19 @@ bool HKRida12(TagCall& c) {
 }
 
 bool RowFieldTag(TagCall& c) {
-    c.tag.Write(RowField(c.state, Cleaned(c)));
+    c.tag.Write(RowField(c.state, tags::Reference(c)));
     return true;
 }
 
 bool PriceFieldTag(TagCall& c) {
-    c.tag.Write(PriceField(c.state, Cleaned(c)));
+    c.tag.Write(PriceField(c.state, tags::Reference(c)));
     return true;
 }
 
 bool Company(TagCall& c) {
     if (!c.state.company.PartnerRecord) return NoOutput(c);
     c.tag.Write(tags::FormatFieldValue(
-        *c.state.company.PartnerRecord, "Partner." + Cleaned(c), "", c.state.region()));
+        *c.state.company.PartnerRecord, "Partner." + tags::Reference(c), "", c.state.region()));
     return true;
 }
 
@@ -149,7 +146,7 @@ bool LisaLink(TagCall& c) {
 bool InfoLink(TagCall& c) {
     data::Record* row = Catalogue(c).CurrentRow.get();
     const std::string article = row == nullptr ? "" : row->GetField("IDGRArticle").ToPlainText();
-    c.tag.Write(c.call.URLFor("KInfo", Cleaned(c)) + "&ID=" + article);
+    c.tag.Write(c.call.URLFor("KInfo", tags::Reference(c)) + "&ID=" + article);
     return true;
 }
 
@@ -172,7 +169,7 @@ bool LastFind(TagCall& c) {
 }
 
 bool Pagelen(TagCall& c) {
-    const auto number = base::ParseNumber(Cleaned(c));
+    const auto number = base::ParseNumber(tags::Reference(c));
     Catalogue(c).PageLength = number ? base::ToInteger16(*number) : std::int16_t{0};
     c.tag.Hide();
     return true;

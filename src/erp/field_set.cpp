@@ -2,25 +2,12 @@
 
 #include <bit>
 
+#include "base/name_hash.h"
+
 namespace zebtell::erp {
 namespace {
 
 constexpr std::size_t kMostFields = 100;
-
-// The same for a small and a capital letter, and for all bytes of letters beyond ASCII.
-std::size_t CaselessByte(char c) {
-    const auto byte = static_cast<unsigned char>(c);
-    return byte < 0x80 ? byte | 0x20U : 0x80U;
-}
-
-// Of the length and some letters: names of columns differ early, and paths differ in their end.
-std::size_t HashOf(std::string_view name) {
-    std::size_t hash = name.size();
-    for (std::size_t i = 0; i < name.size(); i += 1 + i / 4) {
-        hash = hash * 31 + CaselessByte(name[name.size() - 1 - i]);
-    }
-    return hash;
-}
 
 }  // namespace
 
@@ -41,7 +28,7 @@ std::optional<std::size_t> FieldSet::Find(std::string_view name) const {
 
 // Where the name is, or the free place where it would be.
 std::size_t FieldSet::PlaceOf(std::string_view name) const {
-    std::size_t place = HashOf(name) & (places_.size() - 1);
+    std::size_t place = base::NameHash(name) & (places_.size() - 1);
     while (places_[place] != 0) {
         const std::string& known = names_[places_[place] - 1];
         if (known == name || base::EqualNoCase(known, name)) {

@@ -1,7 +1,9 @@
 #include "tags/tag_table.h"
 
+#include <bit>
 #include <stdexcept>
 
+#include "base/name_hash.h"
 #include "base/text.h"
 
 namespace zebtell::tags {
@@ -21,20 +23,32 @@ bool Matches(std::string_view pattern, std::string_view name) {
 
 }  // namespace
 
-TagTable::TagTable(std::initializer_list<TagRow> rows) : rows_(rows) {
+TagTable::TagTable(std::initializer_list<TagRow> rows)
+    : rows_(rows), places_(std::bit_ceil(4 * rows.size() + 1)) {
     for (std::size_t index = 0; index < rows_.size(); ++index) {
-        std::string name = base::LowerAscii(rows_[index].name);
+        lower_names_.push_back(base::LowerAscii(rows_[index].name));
+        const std::string& name = lower_names_.back();
         if (IsPattern(name)) patterns_.emplace_back(name, index);
-        if (!exact_.emplace(std::move(name), index).second) {
+        std::size_t& place = places_[PlaceOf(name)];
+        if (place != 0) {
             throw std::logic_error("tag listed twice: " + std::string(rows_[index].name));
         }
+        place = index + 1;
     }
 }
 
-const TagRow* TagTable::Find(std::string_view lower_name) const {
-    if (const auto found = exact_.find(lower_name); found != exact_.end()) {
-        return &rows_[found->second];
+// Where the name is, or the free place where it would be.
+std::size_t TagTable::PlaceOf(std::string_view lower_name) const {
+    const std::size_t mask = places_.size() - 1;
+    std::size_t place = base::NameHash(lower_name) & mask;
+    while (places_[place] != 0 && lower_names_[places_[place] - 1] != lower_name) {
+        place = (place + 1) & mask;
     }
+    return place;
+}
+
+const TagRow* TagTable::Find(std::string_view lower_name) const {
+    if (const std::size_t row = places_[PlaceOf(lower_name)]; row != 0) return &rows_[row - 1];
     for (const auto& [pattern, index] : patterns_) {
         if (Matches(pattern, lower_name)) return &rows_[index];
     }

@@ -1,11 +1,9 @@
 #pragma once
 
 #include <cstdint>
-#include <functional>
 #include <initializer_list>
 #include <string>
 #include <string_view>
-#include <unordered_map>
 #include <utility>
 #include <vector>
 
@@ -48,16 +46,11 @@ class TagTable {
     const std::vector<TagRow>& rows() const { return rows_; }
 
   private:
-    // Hashes the bytes: names that are asked for are in lower case already.
-    struct NameHash {
-        using is_transparent = void;
-        std::size_t operator()(std::string_view name) const {
-            return std::hash<std::string_view>()(name);
-        }
-    };
+    std::size_t PlaceOf(std::string_view lower_name) const;
 
     std::vector<TagRow> rows_;
-    std::unordered_map<std::string, std::size_t, NameHash, std::equal_to<>> exact_;
+    std::vector<std::string> lower_names_;  // of the rows
+    std::vector<std::size_t> places_;       // open addressing: the row plus 1, 0 for free places
     std::vector<std::pair<std::string, std::size_t>> patterns_;  // in lower case
 };
 
