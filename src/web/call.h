@@ -39,7 +39,8 @@ class Call {
 
     void WriteTemplate() { runtime_.write_template(*this); }
 
-    // The page whose Respond runs when this handler has ended; behind a post the browser asks for it.
+    // The page whose Respond runs when this handler has ended; behind a post the browser asks for
+    // it.
     void NextItem(std::string_view page) { next_item_ = page; }
 
     // "/?page=Kaubainfo&event=Tellimus"; more parameters are appended as "&ID=5". Event names made
