@@ -19,11 +19,6 @@ using host::SessionState;
 constexpr std::int32_t kFavouritesCategory = -1;
 constexpr std::string_view kReadingFailed = "Probleem andmete lugemisel, proovige uuesti!";
 
-void ShowPage(SessionState& state, web::Call& call) {
-    host::SetNoCache(call);
-    host::OrErrorPage(state, call, [&] { call.WriteTemplate(); });
-}
-
 // The three events that fill the list: an error leaves the list that was there and its order, with
 // a message.
 template <class Build>
@@ -41,7 +36,7 @@ void BuildAndShow(SessionState& state, web::Call& call, std::string_view handler
         catalogue.OrderText = order;
         RewindPage(catalogue);
     });
-    ShowPage(state, call);
+    host::ShowPage(state, call);
 }
 
 std::string Posted(const web::Call& call, std::string_view field) {
@@ -122,7 +117,7 @@ void Turn(SessionState& state,
         if (!command.empty()) TurnPage(state.catalogue, command);
         RewindPage(state.catalogue);
     });
-    ShowPage(state, call);
+    host::ShowPage(state, call);
 }
 
 }  // namespace
@@ -134,7 +129,7 @@ void Kaubainfo_Respond(SessionState& state, web::Call& call) {
     catalogue.ListFresh = false;
     RewindPage(catalogue);
     const std::string message = state.Message;
-    ShowPage(state, call);
+    host::ShowPage(state, call);
     // The catalogue opens with the favourites, once the template has said which they are.
     if (!catalogue.FavoritesText.empty() && !catalogue.ListQuery) {
         call.response.Clear();

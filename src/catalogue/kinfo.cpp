@@ -10,11 +10,6 @@ namespace {
 
 using host::SessionState;
 
-void ShowPage(SessionState& state, web::Call& call) {
-    host::SetNoCache(call);
-    host::OrErrorPage(state, call, [&] { call.WriteTemplate(); });
-}
-
 std::shared_ptr<data::Record> ReadArticle(SessionState& state, const std::string& id) {
     if (!base::ParseNumber(id)) return nullptr;
     const auto list = state.application().OpenList("GRArticle", "ID=" + id, "");
@@ -42,7 +37,7 @@ bool Mode(tags::TagCall& c) {
 void KInfo_Respond(SessionState& state, web::Call& call) {
     if (!host::CheckLogon(state, call)) return;
     state.Message.clear();
-    ShowPage(state, call);
+    host::ShowPage(state, call);
 }
 
 void KInfo_ProcessTag(SessionState& state, web::Call& call, markup::Tag& tag) {
@@ -56,7 +51,7 @@ void KInfo_UserEvent(SessionState& state, web::Call& call, std::string_view) {
         state.documents.Article = ReadArticle(state, id);
     };
     host::Guarded(state, "KInfo_UserEvent", read, [&] { state.documents.Article.reset(); });
-    ShowPage(state, call);
+    host::ShowPage(state, call);
 }
 
 const tags::TagTable& KInfoTagTable() {

@@ -29,16 +29,8 @@ void ReadPrices(SessionState& state, std::int64_t row) {
     if (row >= catalogue.PricesFrom && row <= catalogue.PricesTo) return;
     const std::int64_t length = catalogue.PageLength > 0 ? catalogue.PageLength : kUnpagedPrices;
     const std::int64_t to = std::min<std::int64_t>(row + length - 1, catalogue.RowCount);
-    const std::string articles = JoinFieldValues(*catalogue.ListQuery, "IDGRArticle", row, to);
-    const std::int32_t customer = state.company.CustomerKey;
-    catalogue.PriceQuery =
-        state.application().OpenQuery(tags::BuildPriceQuery(state.templates.PriceQueryText,
-                                                            customer,
-                                                            customer,
-                                                            state.company.PriceListId,
-                                                            articles),
-                                      0,
-                                      0);
+    catalogue.PriceQuery = tags::OpenCustomerPrices(
+        state, JoinFieldValues(*catalogue.ListQuery, "IDGRArticle", row, to));
     catalogue.PricesFrom = row;
     catalogue.PricesTo = to;
 }
@@ -55,7 +47,6 @@ void OpenList(SessionState& state, const std::string& criterion) {
     catalogue.CurrentRow.reset();
     catalogue.PriceRow.reset();
     catalogue.PriceQuery.reset();
-    catalogue.PricesFrom = catalogue.PricesTo = 0;
     catalogue.PageNumber = 1;
     catalogue.PageCount = PagesOf(catalogue);
     if (catalogue.PageLength > 0) catalogue.ListFresh = true;
@@ -78,6 +69,8 @@ void TurnPage(CatalogueState& catalogue, std::string_view command) {
 }
 
 void RewindPage(CatalogueState& catalogue) {
+    // The prices are those of the moment, also on a page that was shown before.
+    catalogue.PricesFrom = catalogue.PricesTo = 0;
     catalogue.RowCursor =
         base::ToInteger16(static_cast<double>(catalogue.PageNumber - 1) * catalogue.PageLength + 1);
 }

@@ -10,10 +10,9 @@ namespace {
 
 using host::SessionState;
 
-void ShowPage(SessionState& state, web::Call& call) {
+void ShowOrder(SessionState& state, web::Call& call) {
     tags::RewindOrderView(state);
-    host::SetNoCache(call);
-    host::OrErrorPage(state, call, [&] { call.WriteTemplate(); });
+    host::ShowPage(state, call);
 }
 
 }  // namespace
@@ -21,7 +20,7 @@ void ShowPage(SessionState& state, web::Call& call) {
 void Tellimus_Respond(SessionState& state, web::Call& call) {
     if (!host::CheckLogon(state, call)) return;
     host::Guarded(state, "Tellimus_Respond", [&] { tags::ReadShownOrder(state); });
-    ShowPage(state, call);
+    ShowOrder(state, call);
 }
 
 void Tellimus_ProcessTag(SessionState& state, web::Call& call, markup::Tag& tag) {
@@ -43,7 +42,7 @@ void Tellimus_UserEvent(SessionState& state, web::Call& call, std::string_view e
         state.Message = "Probleem andmete lugemisel, proovige uuesti!";
     };
     host::Guarded(state, "Tellimus_UserEvent", load, show_none);
-    ShowPage(state, call);
+    ShowOrder(state, call);
 }
 
 }  // namespace zebtell::documents

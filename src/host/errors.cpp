@@ -52,6 +52,11 @@ void WriteErrorPage(SessionState& state, web::Call& call, const std::exception& 
         state, UserPart(state) + " error #" + text.number + "\r\n" + text.description, log_Normal);
 }
 
+void ShowPage(SessionState& state, web::Call& call) {
+    SetNoCache(call);
+    OrErrorPage(state, call, [&] { call.WriteTemplate(); });
+}
+
 void LogHandlerError(const SessionState& state,
                      std::string_view handler,
                      const std::exception& error) {

@@ -44,4 +44,7 @@ void OrErrorPage(SessionState& state, web::Call& call, Work&& work) {
     }
 }
 
+// Writes the page's template into a response that nobody keeps.
+void ShowPage(SessionState& state, web::Call& call);
+
 }  // namespace zebtell::host

@@ -106,8 +106,7 @@ std::string LoggedInEntry(const web::Request& request, std::string_view user) {
 }  // namespace
 
 void Logon_Respond(SessionState& state, web::Call& call) {
-    SetNoCache(call);
-    OrErrorPage(state, call, [&] { call.WriteTemplate(); });
+    ShowPage(state, call);
 }
 
 void Logon_Logon(SessionState& state, web::Call& call) {

@@ -83,18 +83,13 @@ void CopyStoredOrder(SessionState& state, std::string_view id) {
     refusals.Tell(state);
 }
 
-void ShowPage(SessionState& state, web::Call& call) {
-    host::SetNoCache(call);
-    host::OrErrorPage(state, call, [&] { call.WriteTemplate(); });
-}
-
 }  // namespace
 
 void Kinnitus_Respond(SessionState& state, web::Call& call) {
     if (!host::CheckLogon(state, call)) return;
     state.basket_form.BasketRowCursor = 1;
     state.basket_form.CurrentBasketRow.reset();
-    ShowPage(state, call);
+    host::ShowPage(state, call);
 }
 
 void Kinnitus_ProcessTag(SessionState& state, web::Call& call, markup::Tag& tag) {
@@ -123,7 +118,7 @@ void Kinnitatud_Respond(SessionState& state, web::Call& call) {
     if (!host::CheckLogon(state, call)) return;
     host::Guarded(state, "Kinnitatud_Respond", [&] { tags::ReadShownOrder(state); });
     tags::RewindOrderView(state);
-    ShowPage(state, call);
+    host::ShowPage(state, call);
 }
 
 void Kinnitatud_ProcessTag(SessionState& state, web::Call& call, markup::Tag& tag) {

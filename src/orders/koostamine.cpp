@@ -78,8 +78,7 @@ void Koostamine_Respond(SessionState& state, web::Call& call) {
     if (!host::CheckLogon(state, call)) return;
     state.basket_form.BasketRowCursor = 1;
     state.basket_form.CurrentBasketRow.reset();
-    host::SetNoCache(call);
-    host::OrErrorPage(state, call, [&] { call.WriteTemplate(); });
+    host::ShowPage(state, call);
 }
 
 void Koostamine_ProcessTag(SessionState& state, web::Call& call, markup::Tag& tag) {

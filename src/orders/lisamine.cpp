@@ -67,8 +67,7 @@ void AddRow(SessionState& state, const web::Call& call) {
 
 void Lisamine_Respond(SessionState& state, web::Call& call) {
     if (!host::CheckLogon(state, call)) return;
-    host::SetNoCache(call);
-    host::OrErrorPage(state, call, [&] { call.WriteTemplate(); });
+    host::ShowPage(state, call);
 }
 
 void Lisamine_ProcessTag(SessionState& state, web::Call& call, markup::Tag& tag) {

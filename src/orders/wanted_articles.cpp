@@ -127,17 +127,9 @@ void FindCodes(SessionState& state, std::vector<Wish>& wishes) {
 // The customer's own price of each article that no price was asked for.
 void TakePrices(SessionState& state, std::vector<WantedArticle>& wanted) {
     if (wanted.empty()) return;
-    const std::string articles =
-        Joined(wanted, [](const WantedArticle& each) { return std::to_string(each.article); });
-    const std::int32_t customer = state.company.CustomerKey;
-    const auto prices =
-        state.application().OpenQuery(tags::BuildPriceQuery(state.templates.PriceQueryText,
-                                                            customer,
-                                                            customer,
-                                                            state.company.PriceListId,
-                                                            articles),
-                                      0,
-                                      0);
+    const auto prices = tags::OpenCustomerPrices(
+        state,
+        Joined(wanted, [](const WantedArticle& each) { return std::to_string(each.article); }));
     for (WantedArticle& each : wanted) {
         if (each.asked.price != Currency()) continue;
         const auto row = prices->Find("idgrarticle=" + std::to_string(each.article));

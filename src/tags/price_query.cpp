@@ -50,4 +50,12 @@ std::string BuildPriceQuery(std::string_view query_text,
     return sql;
 }
 
+std::shared_ptr<data::RecordList> OpenCustomerPrices(const host::SessionState& state,
+                                                     std::string_view articles) {
+    const std::int32_t customer = state.company.CustomerKey;
+    const std::string sql = BuildPriceQuery(
+        state.templates.PriceQueryText, customer, customer, state.company.PriceListId, articles);
+    return state.application().OpenQuery(sql, 0, 0);
+}
+
 }  // namespace zebtell::tags
