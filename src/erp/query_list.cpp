@@ -70,16 +70,23 @@ bool IsNameByte(char c) {
     return c == '_' || (c >= '0' && c <= '9') || (c >= 'A' && c <= 'Z') || (c >= 'a' && c <= 'z');
 }
 
+bool IsBlank(char c) {
+    return c == ' ' || c == '\t' || c == '\r' || c == '\n';
+}
+
 // The first table behind "from" of a plain statement ("select * from SDOrder where ...").
-const TableInfo* SelectedTable(const Schema& schema, std::string_view text) {
-    const std::string sql = base::WithoutControls(text);
-    const std::size_t from = base::FindNoCase(sql, " from ");
-    if (from == std::string_view::npos) {
-        return nullptr;
-    }
-    const std::string_view rest = base::Trimmed(std::string_view(sql).substr(from + 6));
-    const auto end = std::find_if_not(rest.begin(), rest.end(), IsNameByte);
-    return schema.Find(std::string_view(rest.begin(), end));
+const TableInfo* SelectedTable(const Schema& schema, std::string_view sql) {
+    constexpr std::string_view kFrom = "from";
+    std::size_t at = 0;
+    do {
+        at = base::FindNoCase(sql, kFrom, at + 1);
+        if (at == std::string_view::npos || at + kFrom.size() == sql.size()) {
+            return nullptr;
+        }
+    } while (!IsBlank(sql[at - 1]) || !IsBlank(sql[at + kFrom.size()]));
+    const auto name = std::find_if_not(sql.begin() + at + kFrom.size(), sql.end(), IsBlank);
+    const auto end = std::find_if_not(name, sql.end(), IsNameByte);
+    return schema.Find(std::string_view(name, end));
 }
 
 }  // namespace
