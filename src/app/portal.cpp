@@ -59,9 +59,10 @@ class Portal::Parts {
               [this] { return host::NewSession(services); },
               templates,
               RuntimeOptionsOf(settings)),
-          server(OptionsOf(settings), [this](http::Request request, http::Responder respond) {
-              runtime(std::move(request), std::move(respond));
-          }) {
+          server(OptionsOf(settings),
+                 [this](const http::Request& request, http::Responder respond) {
+                     runtime(request, std::move(respond));
+                 }) {
         server.Start();
     }
 
@@ -99,7 +100,7 @@ class Portal::Parts {
 
 Portal::Portal(const std::filesystem::path& component_folder,
                const host::ServerSettings& settings,
-               base::Clock clock)
+               const base::Clock& clock)
     : parts_(std::make_unique<Parts>(component_folder, settings, clock)) {}
 
 Portal::~Portal() = default;

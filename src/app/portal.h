@@ -17,7 +17,7 @@ class Portal {
     // `component_folder` holds ZEBTell.ini. Listens at once; RuntimeError when it can't.
     Portal(const std::filesystem::path& component_folder,
            const host::ServerSettings& settings,
-           base::Clock clock = base::DateTime::Now);
+           const base::Clock& clock = base::DateTime::Now);
     // Stops listening, finishes running requests, ends the sessions.
     ~Portal();
     Portal(const Portal&) = delete;

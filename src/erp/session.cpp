@@ -125,7 +125,7 @@ std::shared_ptr<const KeyTable> Session::ReadKeys(const BoundSql& sql,
 }
 
 // The order of all linked records is read once for all lists; for a short list that of its own.
-std::shared_ptr<const KeyTable> Session::InOrder(std::shared_ptr<const KeyTable> keys,
+std::shared_ptr<const KeyTable> Session::InOrder(const std::shared_ptr<const KeyTable>& keys,
                                                  const LinkedOrder& order) {
     const std::size_t link = *keys->ColumnOf(order.link->name);
     std::string filter;

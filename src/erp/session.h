@@ -49,7 +49,7 @@ class Session {
   private:
     std::shared_ptr<const KeyTable> ReadKeys(const BoundSql& sql,
                                              const std::vector<std::string>& columns);
-    std::shared_ptr<const KeyTable> InOrder(std::shared_ptr<const KeyTable> keys,
+    std::shared_ptr<const KeyTable> InOrder(const std::shared_ptr<const KeyTable>& keys,
                                             const LinkedOrder& order);
     template <class Kept, class Read>
     std::shared_ptr<const Kept> Shared(const std::string& key, Read&& read);
