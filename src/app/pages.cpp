@@ -36,12 +36,12 @@ std::vector<host::Page> PortalPages() {
     using namespace orders;
     return {
         {"Kaubainfo", "zebtell_kaubad.htm", Kaubainfo_Respond, Kaubainfo_ProcessTag, Kaubainfo_UserEvent,
-         {{"Favorites", Kaubainfo_Favorites},
-          {"Hinnakiri", Kaubainfo_Hinnakiri},
+         {{"Favorites", Kaubainfo_Favorites, Work::kMayWait},
+          {"Hinnakiri", Kaubainfo_Hinnakiri, Work::kMayWait},
           {"Lisamine", Kaubainfo_Lisamine},
           {"MuudaRead", Kaubainfo_MuudaRead},
           {"Navigate", Kaubainfo_Navigate},
-          {"Otsing", Kaubainfo_Otsing},
+          {"Otsing", Kaubainfo_Otsing, Work::kMayWait},
           {"Tellimus", Kaubainfo_Tellimus},
           {"UusTellimus", Kaubainfo_UusTellimus}}},
         {"Kasutaja", "zebtell_kasutaja.htm", Kasutaja_Respond, Kasutaja_ProcessTag, nullptr, {}},

@@ -9,8 +9,8 @@
 
 namespace zebtell::web {
 
-// Whether a handler can hold its thread up (a commit, a password hash, a database on the network)
-// and so may not run on an IO thread.
+// Whether a handler can hold its thread up (a commit, a password hash, a search over a whole list,
+// a database on the network) and so may not run on an IO thread.
 enum class Work { kQuick, kMayWait };
 
 template <class State>
