@@ -109,8 +109,8 @@ std::shared_ptr<const KeyTable> Session::Keys(const TableInfo& table,
         database_->translator().ListKeys(reader_, table.name, filter, linked ? "" : order, columns);
     const std::string by_link = linked ? "by " + linked->link->name + " " + linked->order : "";
     auto keys = Shared<KeyTable>(ResultKey('k', sql) + by_link, [&] {
-        auto read = ReadKeys(sql, columns);
-        return linked ? InOrder(std::move(read), *linked) : read;
+        const auto read = ReadKeys(sql, columns);
+        return linked ? InOrder(read, *linked) : read;
     });
     if (fields != known) {
         learned.Learn(key, fields);
