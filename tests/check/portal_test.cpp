@@ -1,10 +1,13 @@
+#include <gmock/gmock.h>
+
 #include "tests/check/check_fixture.h"
+#include "tests/support/source_folder.h"
 
 namespace zebtell::check {
 namespace {
 
 TEST_F(CheckTest, DefaultTemplatesHaveNoFaults) {
-    EXPECT_EQ(Faults(std::filesystem::path(ZEBTELL_SOURCE_DIR) / "templates"), "");
+    EXPECT_EQ(Faults(SourceFolder() / "templates"), "");
 }
 
 TEST_F(CheckTest, EveryTemplateOfThePageTableIsRead) {

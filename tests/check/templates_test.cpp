@@ -1,3 +1,5 @@
+#include <gmock/gmock.h>
+
 #include "tests/check/check_fixture.h"
 
 namespace zebtell::check {

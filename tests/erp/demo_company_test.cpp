@@ -1,5 +1,7 @@
 #include "demo/demo_company.h"
 
+#include <gtest/gtest.h>
+
 #include "base/runtime_error.h"
 #include "data/document_loaders.h"
 #include "data/price_query_text.h"

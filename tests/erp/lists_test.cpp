@@ -1,3 +1,5 @@
+#include <gtest/gtest.h>
+
 #include <thread>
 
 #include "base/runtime_error.h"

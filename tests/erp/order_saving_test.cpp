@@ -1,3 +1,5 @@
+#include <gmock/gmock.h>
+
 #include <thread>
 
 #include "base/runtime_error.h"

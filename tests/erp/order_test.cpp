@@ -1,3 +1,5 @@
+#include <gtest/gtest.h>
+
 #include "base/runtime_error.h"
 #include "tests/erp/company_kit.h"
 

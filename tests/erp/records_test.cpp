@@ -1,3 +1,5 @@
+#include <gtest/gtest.h>
+
 #include "base/runtime_error.h"
 #include "data/price_query_text.h"
 #include "tests/erp/company_kit.h"

@@ -1,3 +1,5 @@
+#include <gtest/gtest.h>
+
 #include "erp/connection_pool.h"
 #include "erp/key_table.h"
 #include "erp/result_cache.h"

@@ -10,6 +10,7 @@
 
 #include "erp/sqlite/backend.h"
 #include "erp/view_links.h"
+#include "tests/support/source_folder.h"
 
 namespace zebtell::erp {
 namespace {
@@ -66,7 +67,7 @@ std::string FileText(const std::string& path) {
 }
 
 void MakeDatabase(const std::string& path) {
-    const std::string folder = ZEBTELL_SOURCE_DIR "/database/sqlite/";
+    const std::string folder = (SourceFolder() / "database/sqlite/").string();
     const std::string script = "BEGIN;" + FileText(folder + "schema.sql") +
                                FileText(folder + "views.sql") + kRows + "COMMIT;";
     sqlite3* database = nullptr;

@@ -6,6 +6,8 @@
 #include <iterator>
 #include <stdexcept>
 
+#include "tests/support/source_folder.h"
+
 namespace zebtell::erp {
 namespace {
 
@@ -66,7 +68,7 @@ void MakeSqliteFile(const std::filesystem::path& file,
     sqlite3* database = nullptr;
     sqlite3_open(file.c_str(), &database);
     Run(database, "pragma journal_mode = wal; begin");
-    const std::filesystem::path folder = ZEBTELL_SOURCE_DIR "/database/sqlite";
+    const std::filesystem::path folder = SourceFolder() / "database/sqlite";
     for (const char* schema_file : schema_files) {
         Run(database, ReadFile(folder / schema_file));
     }

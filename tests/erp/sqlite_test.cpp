@@ -1,3 +1,4 @@
+#include <gtest/gtest.h>
 #include <sqlite3.h>
 
 #include <random>

@@ -1,5 +1,7 @@
 #include "host/logon.h"
 
+#include <gmock/gmock.h>
+
 #include "tests/host/session.h"
 
 namespace zebtell::host {

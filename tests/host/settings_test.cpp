@@ -1,5 +1,7 @@
 #include "host/settings.h"
 
+#include <gtest/gtest.h>
+
 #include "base/runtime_error.h"
 #include "host/ini_file.h"
 #include "host/server_settings.h"

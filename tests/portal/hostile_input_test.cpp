@@ -1,3 +1,5 @@
+#include <gmock/gmock.h>
+
 #include <chrono>
 
 #include "tests/portal/portal_fixture.h"

@@ -1,3 +1,5 @@
+#include <gmock/gmock.h>
+
 #include "tests/portal/portal_fixture.h"
 
 namespace zebtell {

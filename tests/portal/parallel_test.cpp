@@ -1,3 +1,5 @@
+#include <gmock/gmock.h>
+
 #include <atomic>
 #include <thread>
 #include <vector>

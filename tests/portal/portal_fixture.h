@@ -1,5 +1,6 @@
 #pragma once
 
+#include <gtest/gtest.h>
 #include <sqlite3.h>
 
 #include <fstream>
@@ -11,6 +12,7 @@
 #include "app/portal.h"
 #include "erp/password.h"
 #include "tests/portal/browser.h"
+#include "tests/support/source_folder.h"
 #include "tests/support/temp_folder.h"
 
 namespace zebtell {
@@ -60,7 +62,7 @@ class PortalTest : public ::testing::Test {
     static constexpr const char* kUsualSettings = "[Session]\r\nBlocking=3\r\nTimeout=5\r\n";
 
     void SetUp() override {
-        const std::filesystem::path source = ZEBTELL_SOURCE_DIR;
+        const std::filesystem::path source = SourceFolder();
         std::string script = "PRAGMA synchronous = OFF; BEGIN;";
         for (const char* file : {"database/sqlite/schema.sql",
                                  "database/sqlite/views.sql",
