@@ -95,6 +95,12 @@ constexpr Row kSecondRows[] = {
 
 }  // namespace
 
+std::string_view LanguageCode(UserLanguage language) {
+    if (language == UserLanguage::kEnglish) return "en";
+    if (language == UserLanguage::kLatvian) return "lv";
+    return "et";
+}
+
 UserLanguage Settings::language() const {
     const std::string_view two = base::FirstCharacters(Language, 2);
     if (EqualNoCase(two, "EN")) return UserLanguage::kEnglish;

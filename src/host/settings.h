@@ -5,6 +5,7 @@
 #include <memory>
 #include <mutex>
 #include <string>
+#include <string_view>
 
 #include "base/region.h"
 #include "data/data_application.h"
@@ -14,6 +15,9 @@ namespace zebtell::host {
 enum eLogLevels : std::int16_t { log_None = 0, log_Normal = 1, log_Detail = 2, log_Debug = 3 };
 
 enum class UserLanguage { kEstonian, kEnglish, kLatvian };
+
+// "et", "en" or "lv".
+std::string_view LanguageCode(UserLanguage language);
 
 // The settings file's values, one set for the process. Made by LoadSettings, then only read.
 struct Settings {

@@ -40,6 +40,17 @@ bool WEBLanguage(TagCall& call) {
     return kHandled;
 }
 
+bool Lang(TagCall& call) {
+    call.tag.Write(std::string(host::LanguageCode(call.state.settings()->language())));
+    return kHandled;
+}
+
+// Texts are translated as templates are read; this is one that a tag has put on the page.
+bool Text(TagCall& call) {
+    call.tag.Show();
+    return kHandled;
+}
+
 bool LogonPWD(TagCall& call) {
     ShowIf(call, !IDCardLogon);
     return kHandled;
@@ -110,6 +121,8 @@ const TagTable& CommonTagTable() {
         {"ZEB:WEBUser", WEBUser, "Contents for named users only"},
         {"ZEB:WEBMessage", WEBMessage, "Once: contents with the message in place of \"Message\""},
         {"ZEB:WEBLanguage", WEBLanguage, "Sets the page's language"},
+        {"ZEB:Lang", Lang, "Code of the language that the page is in: et, en, lv"},
+        {"ZEB:Text", Text, "Contents in the language of the page"},
         {"ZEB:LogonPWD", LogonPWD, "Contents when users log on with a password"},
         {"ZEB:LogonEID", LogonEID, "Contents when users log on with an ID card"},
         {"ZEB:CreateCombo",
