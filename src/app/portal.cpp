@@ -44,7 +44,7 @@ class Portal::Parts {
           const base::Clock& clock)
         : databases(clock),
           templates(settings.TemplateFolder),
-          static_files(settings.TemplateFolder / "static",
+          static_files({settings.TemplateFolder / "static"},
                        WithSlash(settings.BasePath) + "static/"),
           global_settings(component_folder),
           services{global_settings, [this] { return databases.NewApplication(); }, clock},

@@ -60,6 +60,17 @@ bool IsInside(const fs::path& folder, const fs::path& file) {
     return in_folder == folder.end() && in_file != file.end();
 }
 
+// Where a file of the folder really lies; nothing when it is not there or not to be sent.
+std::optional<fs::path> FileOf(const fs::path& in_folder, const std::string& name) {
+    std::error_code error;
+    const fs::path folder = fs::canonical(in_folder, error);
+    if (error) return {};
+    fs::path path = fs::canonical(folder / name, error);
+    if (error || !IsInside(folder, path) || ContentType(path.native()).empty()) return {};
+    if (!fs::is_regular_file(path, error) || fs::file_size(path, error) > kMaxBytes) return {};
+    return path;
+}
+
 // FNV-1a: the same bytes have the same tag on every server and after every deployment.
 std::string ETag(std::string_view bytes) {
     std::uint64_t hash = 0xcbf29ce484222325U;
@@ -91,8 +102,8 @@ bool HasTag(std::string_view list, std::string_view etag) {
 
 }  // namespace
 
-StaticFiles::StaticFiles(fs::path folder, std::string prefix)
-    : folder_(std::move(folder)), prefix_(std::move(prefix)) {}
+StaticFiles::StaticFiles(std::vector<fs::path> folders, std::string prefix)
+    : folders_(std::move(folders)), prefix_(std::move(prefix)) {}
 
 std::optional<Response> StaticFiles::Serve(const Request& request) {
     const std::string_view path = request.Path();
@@ -128,16 +139,16 @@ StaticFiles::FilePointer StaticFiles::Find(const std::string& name) {
 
 StaticFiles::FilePointer StaticFiles::Load(const std::string& name,
                                            const FilePointer& known) const {
+    std::optional<fs::path> path;
+    for (auto folder = folders_.begin(); !path && folder != folders_.end(); ++folder) {
+        path = FileOf(*folder, name);
+    }
+    if (!path) return nullptr;
     std::error_code error;
-    const fs::path folder = fs::canonical(folder_, error);
+    const auto stamp = fs::last_write_time(*path, error);
     if (error) return nullptr;
-    const fs::path path = fs::canonical(folder / name, error);
-    if (error || !IsInside(folder, path) || ContentType(path.native()).empty()) return nullptr;
-    if (!fs::is_regular_file(path, error) || fs::file_size(path, error) > kMaxBytes) return nullptr;
-    const auto stamp = fs::last_write_time(path, error);
-    if (error) return nullptr;
-    if (known && known->stamp == stamp) return known;
-    auto bytes = ReadFile(path);
+    if (known && known->path == *path && known->stamp == stamp) return known;
+    auto bytes = ReadFile(*path);
     if (!bytes) return nullptr;
     auto file = std::make_shared<File>();
     file->bytes = std::move(*bytes);
@@ -145,6 +156,7 @@ StaticFiles::FilePointer StaticFiles::Load(const std::string& name,
     file->etag = ETag(file->bytes);
     file->modified = std::chrono::system_clock::to_time_t(
         std::chrono::file_clock::to_sys(std::chrono::time_point_cast<std::chrono::seconds>(stamp)));
+    file->path = std::move(*path);
     file->stamp = stamp;
     return file;
 }

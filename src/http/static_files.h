@@ -9,21 +9,23 @@
 #include <string>
 #include <string_view>
 #include <unordered_map>
+#include <vector>
 
 #include "http/message.h"
 
 namespace zebtell::http {
 
-// The files of one folder, such as style sheets and pictures, under one path. Only files of the
-// known kinds (see static_files.cpp) whose real place is inside the folder, no names that begin
-// with a dot, none over 4 MB: everything else is 404, so what lies there for the server alone
-// (templates, settings, databases, logs) stays there.
+// The files of some folders, such as style sheets and pictures, under one path; of files of the
+// same name the first folder's counts. Only files of the known kinds (see static_files.cpp) whose
+// real place is inside its folder, no names that begin with a dot, none over 4 MB: everything else
+// is 404, so what lies there for the server alone (templates, settings, databases, logs) stays
+// there.
 //
 // Files are kept in memory once asked for; a change on disk shows within a second. For any thread.
 class StaticFiles {
   public:
     // `prefix` begins and ends with "/" ("/static/"). A folder that is not there has no files.
-    StaticFiles(std::filesystem::path folder, std::string prefix);
+    StaticFiles(std::vector<std::filesystem::path> folders, std::string prefix);
 
     // The answer to a request for a path under the prefix, nothing for other paths.
     std::optional<Response> Serve(const Request& request);
@@ -36,6 +38,7 @@ class StaticFiles {
         std::string_view content_type;
         std::string etag;
         std::time_t modified = 0;
+        std::filesystem::path path;
         std::filesystem::file_time_type stamp;
     };
     using FilePointer = std::shared_ptr<const File>;
@@ -49,7 +52,7 @@ class StaticFiles {
     FilePointer Load(const std::string& name, const FilePointer& known) const;
     static Response Answer(const Request& request, const FilePointer& file);
 
-    const std::filesystem::path folder_;
+    const std::vector<std::filesystem::path> folders_;
     const std::string prefix_;
     std::mutex mutex_;
     std::unordered_map<std::string, Entry> files_;

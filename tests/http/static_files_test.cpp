@@ -15,6 +15,7 @@ class StaticFilesTest : public ::testing::Test {
   protected:
     StaticFilesTest() {
         fs::create_directories(root_ / "site/css");
+        fs::create_directories(root_ / "more/css");
         Write("site/css/style.css", "body {}");
         for (const char* name : {"site/page.htm",
                                  "site/zebtell.ini",
@@ -50,7 +51,7 @@ class StaticFilesTest : public ::testing::Test {
 
     const fs::path root_ =
         fs::temp_directory_path() / ("zebtell_static_" + std::to_string(::getpid()));
-    StaticFiles files_{root_ / "site", "/static/"};
+    StaticFiles files_{{root_ / "site", root_ / "more"}, "/static/"};
 };
 
 TEST_F(StaticFilesTest, ServesWithTypeAndValidators) {
@@ -142,8 +143,12 @@ TEST_F(StaticFilesTest, NoticesChanges) {
     EXPECT_NE(HeaderOf(*after, "ETag"), HeaderOf(*before, "ETag"));
     EXPECT_EQ(*before->shared_body, "body {}") << "still being sent somewhere";
     fs::remove(root_ / "site/css/style.css");
+    Write("more/css/gone.css", "i {}");
+    EXPECT_EQ(Status("/static/css/gone.css"), 200);
+    fs::rename(root_ / "more/css/gone.css", root_ / "more/css/style.css");
     std::this_thread::sleep_for(std::chrono::milliseconds(1050));
-    EXPECT_EQ(Status("/static/css/style.css"), 404);
+    EXPECT_EQ(*Ask("/static/css/style.css")->shared_body, "i {}") << "of the second folder";
+    EXPECT_EQ(Status("/static/css/gone.css"), 404);
 }
 
 }  // namespace
