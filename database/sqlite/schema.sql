@@ -193,7 +193,7 @@ CREATE TABLE SDOrder (
     Amount MONEY NOT NULL DEFAULT 0,
     TaxAmount MONEY NOT NULL DEFAULT 0,
     AmountWTax MONEY NOT NULL DEFAULT 0,
-    -- A price in it is not the one that the customer was offered.
+    -- A row has a ReviewPrice. Staff look at such orders in the view SDOrderReview.
     NeedsReview BIT NOT NULL DEFAULT 0
 );
 CREATE INDEX SDOrder_Company ON SDOrder(IDGRCompany, DocDate);
@@ -214,6 +214,9 @@ CREATE TABLE SDOrderRow (
     TaxPercent REAL NOT NULL DEFAULT 0,
     Explanation NVARCHAR(500),
     DeliveredQuantity REAL NOT NULL DEFAULT 0 CHECK (DeliveredQuantity >= 0),
+    -- What one would have cost by the customer's price list, where he ordered for less; 0: he has no
+    -- price for the article. NULL: nothing to look at.
+    ReviewPrice MONEY CHECK (ReviewPrice >= 0),
     -- Bits. 4: the ERP made the row (transport, packaging), the customer leaves it alone.
     Status INTEGER NOT NULL DEFAULT 0
 );

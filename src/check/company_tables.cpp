@@ -53,7 +53,7 @@ constexpr NeededTable kNeeded[] = {
      "NeedsReview"},
     {"SDOrderRow",
      "IDSDOrder>SDOrder RowNo IDGRArticle>GRArticle Quantity Price UnitPrice PriceCut Amount "
-     "TaxPercent Explanation DeliveredQuantity Status"},
+     "TaxPercent Explanation DeliveredQuantity ReviewPrice Status"},
     {"SDConsignmD",
      "Number DocDate State IDGRCompany>GRCompany IDGRCompContPerson>GRCompContPerson "
      "IDGRPriceList>GRPriceList CompanyName CompanyAddr Explanation Amount TaxAmount AmountWTax"},

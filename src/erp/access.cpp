@@ -10,7 +10,7 @@ namespace zebtell::erp {
 namespace {
 
 constexpr std::string_view kEvery = "";
-constexpr std::string_view kNo = "no";
+constexpr std::string_view kNo = AccessRule::kNoRows;
 
 constexpr std::string_view kOwnLists = "IDGRPriceList in (:price_lists)";
 constexpr std::string_view kOwnDocuments = "IDGRCompany = :partner";
@@ -82,6 +82,9 @@ const std::array kPolicy = std::to_array<AccessRule>({
      {"DocKey"}},
     {"GDocRel",            kBetweenOwnDocuments,       kNo},
     {"GDTax",              kOfOwnDocuments,            "IDGDocument in (:saved_documents)"},
+
+    // The staff's
+    {"SDOrderReview",      kNo,                        kNo},
 });
 // clang-format on
 

@@ -28,15 +28,21 @@ struct Reader {
 
 // One row of the access policy: default is no, so a table that has no row can't be read.
 struct AccessRule {
+    static constexpr std::string_view kNoRows = "no";
+
     std::string_view table;
     // An SQL condition on the table's own columns; ":partner", ":price_lists" and so on stand for
-    // the reader's values. Empty: every row.
+    // the reader's values. Empty: every row; kNoRows: the table can't be read at all.
     std::string_view user_scope;
-    std::string_view guest_scope;  // "no": guests may not read the table at all
+    std::string_view guest_scope;
     // Columns that nobody reads through the portal.
     std::vector<std::string_view> hidden_columns = {};
     // Columns that a customer may write (in new documents and in his own unprocessed ones).
     std::vector<std::string_view> writable_columns = {};
+
+    std::string_view Scope(Role role) const {
+        return role == Role::kUser ? user_scope : guest_scope;
+    }
 };
 
 // The whole policy, to be read at a glance.

@@ -1,7 +1,5 @@
 #include "erp/order_review.h"
 
-#include <algorithm>
-
 #include "erp/order_price.h"
 
 namespace zebtell::erp {
@@ -29,17 +27,27 @@ bool IsBelow(const OrderRow& row, base::Currency own) {
            fields.Money("Amount") < base::Multiplied(own, fields.Number("Quantity"), 2);
 }
 
+// An article without a price, or with the price 0, has none that could be kept to.
+std::optional<base::Currency> ReviewPrice(const OrderRow& row, const OwnPrices& prices) {
+    if (row.IsFixed() || !row.IsToStore()) {
+        return std::nullopt;
+    }
+    const auto found = prices.find(row.fields.Integer("IDGRArticle"));
+    const base::Currency own = found == prices.end() ? base::Currency() : found->second.price;
+    const bool has_none = own == base::Currency();
+    return has_none || IsBelow(row, own) ? std::optional(own) : std::nullopt;
+}
+
 }  // namespace
 
-bool NeedsReview(const Order& order, Connection& connection) {
+std::vector<std::optional<base::Currency>> ReviewPrices(const Order& order,
+                                                        Connection& connection) {
     const OwnPrices prices = PricesNow(order, connection);
-    return std::any_of(order.rows.begin(), order.rows.end(), [&prices](const auto& row) {
-        if (row->IsFixed() || !row->IsToStore()) {
-            return false;
-        }
-        const auto own = prices.find(row->fields.Integer("IDGRArticle"));
-        return own == prices.end() || IsBelow(*row, own->second.price);
-    });
+    std::vector<std::optional<base::Currency>> review_prices;
+    for (const auto& row : order.rows) {
+        review_prices.push_back(ReviewPrice(*row, prices));
+    }
+    return review_prices;
 }
 
 }  // namespace zebtell::erp

@@ -40,7 +40,10 @@ constexpr const char* kRowColumns[] = {"IDGRArticle",
 class Saving {
   public:
     Saving(Order& order, Connection& connection)
-        : order_(order), session_(*order.session()), connection_(connection) {}
+        : order_(order),
+          session_(*order.session()),
+          connection_(connection),
+          review_prices_(ReviewPrices(order, connection)) {}
 
     Stored Run() {
         stored_.row_ids.assign(order_.rows.size(), 0);
@@ -67,6 +70,7 @@ class Saving {
     Order& order_;
     Session& session_;
     Connection& connection_;
+    const std::vector<std::optional<base::Currency>> review_prices_;  // by row
     Stored stored_;
 };
 
@@ -156,6 +160,8 @@ void Saving::StoreRows() {
             continue;
         }
         ColumnValues values = ValuesOf(row.fields, kRowColumns);
+        const auto& review_price = review_prices_[i];
+        values.emplace_back("ReviewPrice", review_price ? *review_price : base::Value::Null());
         if (row.id > 0) {
             connection_.Execute(UpdateSql(kOrderRowTable, row.id, values));
             stored_.row_ids[i] = row.id;
@@ -189,10 +195,13 @@ std::optional<OrderImage> Saving::Image(std::int64_t id) {
 
 ColumnValues Saving::Sums() {
     const OrderSums sums = SumsOf(order_);
+    const bool needs_review = std::any_of(review_prices_.begin(),
+                                          review_prices_.end(),
+                                          [](const auto& price) { return price.has_value(); });
     return {{"Amount", sums.amount},
             {"TaxAmount", sums.tax_amount},
             {"AmountWTax", sums.with_tax()},
-            {"NeedsReview", NeedsReview(order_, connection_)}};
+            {"NeedsReview", needs_review}};
 }
 
 ColumnValues Saving::ValuesOf(const RecordFields& fields,

@@ -31,7 +31,7 @@ TEST_F(CheckTest, DatabaseThatIsNotThereHidesNoTemplateFault) {
 
 TEST_F(CheckTest, AllThatTheDatabaseLacksIsNamed) {
     Change(
-        "DROP VIEW SQCatPriceList5; DROP TABLE GDocRel;"
+        "DROP VIEW SQCatPriceList5; DROP VIEW SDOrderReview; DROP TABLE GDocRel;"
         "ALTER TABLE SDOrder DROP COLUMN NeedsReview;"
         "ALTER TABLE GRCompany DROP COLUMN IDEREmployee;"
         "ALTER TABLE GRCompany ADD COLUMN IDEREmployee INTEGER;");

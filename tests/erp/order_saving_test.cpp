@@ -149,15 +149,19 @@ TEST_P(OrderSavingTest, PricesBelowTheOwnAreMarkedForReview) {
             company_->Run(sql);
         }
         order->Save();
-        return company_->Show("select NeedsReview, Amount from SDOrder order by ID desc limit 1");
+        return company_->Show(
+            "select o.NeedsReview, o.Amount, r.ReviewPrice, v.Missing from SDOrder o"
+            " join SDOrderRow r on r.IDSDOrder = o.ID left join SDOrderReview v on v.ID = r.ID"
+            " where o.ID = (select max(ID) from SDOrder)");
     };
-    EXPECT_EQ(review("", ""), "0 5.26;");
-    EXPECT_EQ(review("5.25", ""), "1 5.25;");
-    EXPECT_EQ(review("9", ""), "0 9;");
-    EXPECT_EQ(review("", "", "2.63"), "0 5.26;");
-    EXPECT_EQ(review("", "", "2.62"), "1 5.26;");
-    EXPECT_EQ(review("", "update GRPriceListRel set Price = 3.10 where ID = 103"), "1 5.26;");
-    EXPECT_EQ(review("", "delete from GRPriceListRel where ID = 103"), "1 5.42;");
+    EXPECT_EQ(review("", ""), "0 5.26  ;");
+    EXPECT_EQ(review("5.25", ""), "1 5.25 2.63 0.01;");
+    EXPECT_EQ(review("9", ""), "0 9  ;");
+    EXPECT_EQ(review("", "", "2.63"), "0 5.26  ;");
+    EXPECT_EQ(review("", "", "2.62"), "1 5.26 2.63 0;");
+    EXPECT_EQ(review("", "update GRPriceListRel set Price = 3.10 where ID = 103"),
+              "1 5.26 2.71 0.16;");
+    EXPECT_EQ(review("", "delete from GRPriceListRel where ID = 103"), "1 5.42 0 -5.42;");
 }
 
 TEST_P(OrderSavingTest, AGuestSeesWhatHeHasStored) {

@@ -90,7 +90,7 @@ Source& Names::Make() {
 
 Source& Names::Open(std::string_view table) {
     const AccessRule* rule = FindAccessRule(table);
-    if (!rule || (role_ == Role::kGuest && rule->guest_scope == "no")) {
+    if (!rule || rule->Scope(role_) == AccessRule::kNoRows) {
         FailNoTable(table);
     }
     Source& source = OpenUnlimited(table);

@@ -15,7 +15,7 @@ struct RuleScopes {
 };
 
 ExprPtr Parsed(std::string_view scope) {
-    return scope.empty() || scope == "no" ? nullptr
+    return scope.empty() || scope == AccessRule::kNoRows ? nullptr
                                           : Parser(scope, Style::kPolicy).ParseCondition();
 }
 
