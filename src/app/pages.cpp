@@ -57,7 +57,7 @@ std::vector<host::Page> PortalPages() {
         {"Logon", "zebtell_logon.htm", Logon_Respond, Shared_ProcessTag, nullptr,
          {{"Logon", Logon_Logon, Work::kMayWait}}},
         {"Logout", "zebtell_logout.htm", Logout_Respond, Shared_ProcessTag, nullptr,
-         {{"Hyperlink2", Logout_Hyperlink2}}},
+         {{"Hyperlink2", Logout_Hyperlink2}}, true},
         {"Raamistik", "zebtell_frame.htm", Raamistik_Respond, Shared_ProcessTag, nullptr, {}},
         {"Tellimus", "zebtell_tellimus.htm", Tellimus_Respond, Tellimus_ProcessTag, Tellimus_UserEvent, {}},
         {"Vasak", "zebtell_vasak.htm", Vasak_Respond, Shared_ProcessTag, nullptr,

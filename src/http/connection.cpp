@@ -87,7 +87,7 @@ class StreamConnection final : public Connection {
     bool is_reading_ = false;
     bool has_continued_ = false;
     bool is_head_ = false;
-    After after_ = After::kClose;
+    Sending sending_{After::kClose, kIsTls};
     std::size_t requests_ = 0;
     Response response_;
     std::string head_;
@@ -186,13 +186,14 @@ void StreamConnection<Stream>::Handle() {
     deadline_ = Worker::Clock::time_point::max();
     const bool keeps = ++requests_ < options_.limits.requests_per_connection &&
                        parser_.keep_alive() && !worker_->stopping();
-    after_ = !keeps                ? After::kClose
-             : parser_.is_http10() ? After::kKeepAliveHttp10
-                                   : After::kKeepAlive;
+    sending_.after = !keeps                ? After::kClose
+                     : parser_.is_http10() ? After::kKeepAliveHttp10
+                                           : After::kKeepAlive;
     is_head_ = parser_.is_head();
     Request request = parser_.TakeRequest();
     ServerContext& context = worker_->context();
     context.proxies.SetClient(request, peer_, kIsTls);
+    sending_.secure = request.secure;
     try {
         context.handler(std::move(request), MakeResponder(weak_from_this()));
     } catch (const std::exception& error) {
@@ -213,14 +214,14 @@ void StreamConnection<Stream>::Send(Response response) {
     if (phase_ != Phase::kHandling) return;
     response_ = std::move(response);
     if (response_.status < 200 || response_.status > 599) response_ = ErrorResponse(500);
-    if (worker_->stopping()) after_ = After::kClose;
+    if (worker_->stopping()) sending_.after = After::kClose;
     Write();
 }
 
 template <class Stream>
 void StreamConnection<Stream>::Refuse(int status) {
     is_head_ = parser_.is_head();
-    after_ = After::kClose;
+    sending_.after = After::kClose;
     response_ = ErrorResponse(status);
     Write();
 }
@@ -228,7 +229,7 @@ void StreamConnection<Stream>::Refuse(int status) {
 template <class Stream>
 void StreamConnection<Stream>::Write() {
     head_.clear();
-    AppendHead(head_, response_, worker_->Date(), after_);
+    AppendHead(head_, response_, worker_->Date(), sending_);
     const std::string& text = response_.shared_body ? *response_.shared_body : response_.body;
     const bool has_body = !is_head_ && HasBody(response_.status);
     const std::array<asio::const_buffer, 2> buffers = {
@@ -245,7 +246,7 @@ void StreamConnection<Stream>::OnWritten(const error_code& error) {
     if (phase_ == Phase::kClosed) return;
     if (error) return Close();
     response_ = {};
-    if (after_ == After::kClose) return Linger();
+    if (sending_.after == After::kClose) return Linger();
     parser_.Reset();
     has_continued_ = false;
     ProcessInput();

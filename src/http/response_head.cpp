@@ -41,6 +41,21 @@ constexpr std::pair<int, std::string_view> kReasons[] = {
     {505, "HTTP Version Not Supported"},
 };
 
+// It loads nothing from other sites, is framed by its own only and loaded by its own only.
+constexpr std::pair<std::string_view, std::string_view> kStrictHeaders[] = {
+    {"X-Content-Type-Options", "nosniff"},
+    {"Referrer-Policy", "same-origin"},
+    {"X-Frame-Options", "SAMEORIGIN"},
+    {"Cross-Origin-Opener-Policy", "same-origin"},
+    {"Cross-Origin-Resource-Policy", "same-origin"},
+    {"Content-Security-Policy",
+     "default-src 'self'; frame-ancestors 'self'; form-action 'self'; base-uri 'self'; "
+     "object-src 'none'"},
+};
+
+// For a year the browser comes by https only. Other hosts of the domain are not ours to bind.
+constexpr std::string_view kStayWithTls = "Strict-Transport-Security: max-age=31536000\r\n";
+
 std::string_view Reason(int status) {
     const auto* const found = std::find_if(std::begin(kReasons),
                                            std::end(kReasons),
@@ -66,6 +81,19 @@ void AppendLineText(std::string& out, std::string_view text) {
     }
 }
 
+void AppendHeader(std::string& out, std::string_view name, std::string_view value) {
+    AppendLineText(out, name);
+    out += ": ";
+    AppendLineText(out, value);
+    out += "\r\n";
+}
+
+bool Has(const Response& response, std::string_view name) {
+    return std::any_of(response.headers.begin(), response.headers.end(), [&](const Header& header) {
+        return header.first.size() == name.size() && base::EqualNoCase(header.first, name);
+    });
+}
+
 std::string_view ConnectionHeader(After after) {
     switch (after) {
         case After::kKeepAliveHttp10:
@@ -84,7 +112,7 @@ bool HasBody(int status) {
     return status != 204 && status != 304;
 }
 
-void AppendHead(std::string& out, const Response& response, std::string_view date, After after) {
+void AppendHead(std::string& out, const Response& response, std::string_view date, Sending how) {
     out += "HTTP/1.1 ";
     AppendNumber(out, static_cast<std::size_t>(response.status));
     out += ' ';
@@ -92,19 +120,18 @@ void AppendHead(std::string& out, const Response& response, std::string_view dat
     out += "\r\nServer: ZEBTell\r\nDate: ";
     out += date;
     out += "\r\n";
-    for (const auto& [name, value] : response.headers) {
-        AppendLineText(out, name);
-        out += ": ";
-        AppendLineText(out, value);
-        out += "\r\n";
+    for (const auto& [name, value] : response.headers) AppendHeader(out, name, value);
+    for (const auto& [name, value] : kStrictHeaders) {
+        if (!Has(response, name)) AppendHeader(out, name, value);
     }
+    if (how.secure) out += kStayWithTls;
     if (HasBody(response.status)) {
         out += "Content-Length: ";
         AppendNumber(out,
                      response.shared_body ? response.shared_body->size() : response.body.size());
         out += "\r\n";
     }
-    out += ConnectionHeader(after);
+    out += ConnectionHeader(how.after);
     out += "\r\n";
 }
 

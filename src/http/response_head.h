@@ -12,9 +12,16 @@ namespace zebtell::http {
 // How the connection goes on behind a response, for its Connection header.
 enum class After { kKeepAlive, kKeepAliveHttp10, kClose };
 
+// How a response goes out.
+struct Sending {
+    After after = After::kClose;
+    bool secure = false;  // over TLS, here or at a trusted proxy
+};
+
 // Appends the status line and all headers of a response, the empty line included. `date` is the
-// value of the Date header.
-void AppendHead(std::string& out, const Response& response, std::string_view date, After after);
+// value of the Date header. What makes browsers strict goes with every response, whoever made it,
+// unless it brings a header of that name itself.
+void AppendHead(std::string& out, const Response& response, std::string_view date, Sending how);
 
 // Whether a response of that status has a body at all.
 bool HasBody(int status);

@@ -175,7 +175,6 @@ Response StaticFiles::Answer(const Request& request, const FilePointer& file) {
         return response;
     }
     response.headers.emplace_back("Content-Type", file->content_type);
-    response.headers.emplace_back("X-Content-Type-Options", "nosniff");
     response.shared_body = std::shared_ptr<const std::string>(file, &file->bytes);
     return response;
 }

@@ -10,21 +10,31 @@ std::string_view WithoutPort(std::string_view host, std::string_view default_por
     return host;
 }
 
-bool IsOtherOrigin(std::string_view origin, std::string_view host) {
-    const std::size_t mark = origin.find("://");
-    if (mark == origin.npos) return true;  // "null": from nowhere that could be ours
-    const std::string_view port =
-        base::EqualNoCase(origin.substr(0, mark), "https") ? ":443" : ":80";
-    return !base::EqualNoCase(WithoutPort(origin.substr(mark + 3), port), WithoutPort(host, port));
+// `from` is an origin or a whole address.
+bool IsOtherOrigin(std::string_view from, std::string_view host) {
+    const std::size_t mark = from.find("://");
+    if (mark == from.npos) return true;  // "null": from nowhere that could be ours
+    const std::string_view port = base::EqualNoCase(from.substr(0, mark), "https") ? ":443" : ":80";
+    from.remove_prefix(mark + 3);
+    from = from.substr(0, from.find('/'));
+    return !base::EqualNoCase(WithoutPort(from, port), WithoutPort(host, port));
+}
+
+bool IsBrowser(const http::Request& request) {
+    return base::StartsWithNoCase(request.HeaderValue("User-Agent"), "Mozilla/");
 }
 
 }  // namespace
 
 bool IsCrossSite(const http::Request& request) {
     const std::string_view site = request.HeaderValue("Sec-Fetch-Site");
-    if (base::EqualNoCase(site, "cross-site") || base::EqualNoCase(site, "same-site")) return true;
-    const std::string_view origin = request.HeaderValue("Origin");
-    return !origin.empty() && IsOtherOrigin(origin, request.HeaderValue("Host"));
+    const bool is_own = base::EqualNoCase(site, "same-origin") || base::EqualNoCase(site, "none");
+    if (!site.empty() && !is_own) return true;
+    for (const std::string_view name : {"Origin", "Referer"}) {
+        const std::string_view from = request.HeaderValue(name);
+        if (!from.empty()) return IsOtherOrigin(from, request.HeaderValue("Host"));
+    }
+    return site.empty() && IsBrowser(request);
 }
 
 }  // namespace zebtell::web

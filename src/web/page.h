@@ -31,6 +31,9 @@ struct Page {
     // For event names made at run time. Null: such events show the page's template.
     void (*UserEvent)(State&, Call&, std::string_view event) = nullptr;
     std::vector<PageEvent<State>> events;
+    // Whether Respond changes something, so that links from other sites are refused as they are for
+    // events.
+    bool RespondActs = false;
 };
 
 // What the runtime raises on the application around the pages.

@@ -55,7 +55,8 @@ Site MakeSite(const std::vector<Page<State>>& table,
                       .respond = OnInstance(row.Respond),
                       .process_tag = OnInstance(row.ProcessTag),
                       .user_event = OnInstance(row.UserEvent),
-                      .events = {}};
+                      .events = {},
+                      .respond_acts = row.RespondActs};
         for (const PageEvent<State>& event : row.events)
             page.events.push_back({std::string(event.name), OnInstance(event.handle), event.work});
         pages.push_back(std::move(page));

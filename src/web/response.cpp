@@ -11,17 +11,11 @@
 namespace zebtell::web {
 namespace {
 
-// What every page says unless it says otherwise: it loads nothing from other sites, is framed by
-// its own only, and, since it shows a customer's own figures, is kept by no shared cache.
+// What every page says unless it says otherwise: since it shows a customer's own figures, it is
+// kept by no shared cache.
 constexpr std::pair<std::string_view, std::string_view> kDefaultHeaders[] = {
     {"Content-Type", "text/html; charset=utf-8"},
     {"Cache-Control", "private"},
-    {"X-Content-Type-Options", "nosniff"},
-    {"Referrer-Policy", "same-origin"},
-    {"X-Frame-Options", "SAMEORIGIN"},
-    {"Content-Security-Policy",
-     "default-src 'self'; frame-ancestors 'self'; form-action 'self'; base-uri 'self'; "
-     "object-src 'none'"},
 };
 
 void RefuseLineBreaks(std::string_view text) {

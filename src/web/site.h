@@ -39,6 +39,7 @@ struct SitePage {
     std::function<void(SessionInstance&, Call&, markup::Tag&)> process_tag;
     std::function<void(SessionInstance&, Call&, std::string_view event)> user_event;
     std::vector<SiteEvent> events;
+    bool respond_acts = false;
 
     const SiteEvent* FindEvent(std::string_view event) const;
 };

@@ -22,8 +22,9 @@ RuntimeOptions Checked(RuntimeOptions options) {
     return options;
 }
 
-bool MayChangeState(const Request& request) {
-    return request.method == "POST" || !request.event.empty();
+bool MayChangeState(const Request& request, const SitePage* page) {
+    return request.method == "POST" || !request.event.empty() ||
+           (page != nullptr && page->respond_acts);
 }
 
 }  // namespace
@@ -65,9 +66,9 @@ void SiteRuntime::Handle(const http::Request& request, http::Responder respond) 
     if (const auto* refusal = std::get_if<Refusal>(&parsed))
         return respond(PlainPage(refusal->status));
     Request& page_request = std::get<Request>(parsed);
-    if (!page_request.page.empty() && site_.Find(page_request.page) == nullptr)
-        return respond(PlainPage(404));
-    if (MayChangeState(page_request) && IsCrossSite(request)) return respond(PlainPage(403));
+    const SitePage* page = site_.Find(page_request.page);
+    if (page == nullptr && !page_request.page.empty()) return respond(PlainPage(404));
+    if (MayChangeState(page_request, page) && IsCrossSite(request)) return respond(PlainPage(403));
 
     auto job = std::make_shared<Job>();
     job->session = SessionFor(request, job->new_token);

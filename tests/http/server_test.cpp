@@ -149,6 +149,35 @@ TEST(Server, AsksForTheBodyThatWaitsToBeAskedFor) {
     EXPECT_EQ(client.Ask(head + "99999999\r\n\r\n").status, 413);
 }
 
+// Browsers are told to be strict by every answer, also by those that no handler made.
+TEST(Server, EveryAnswerIsStrict) {
+    ServerOptions options = TwoThreads();
+    options.trusted_proxies = {"127.0.0.1"};
+    TestServer test(
+        [](const Request& request, const Responder& respond) {
+            Response response = Text("x");
+            if (request.target == "/own") {
+                response.headers = {{"content-security-policy", "default-src 'none'"}};
+            }
+            respond(std::move(response));
+        },
+        std::move(options));
+    const std::string over_tls = "X-Forwarded-Proto: https\r\n";
+    for (const std::string& request :
+         {Get("/"), Get("/", over_tls), Get("http://a/"), std::string("TEA / HTTP/1.1\r\n\r\n")}) {
+        const RawResponse answer = test.Connect().Ask(request);
+        EXPECT_EQ(answer.Header("X-Content-Type-Options"), "nosniff") << request;
+        EXPECT_EQ(answer.Header("Referrer-Policy"), "same-origin") << request;
+        EXPECT_THAT(answer.Header("Content-Security-Policy"),
+                    ::testing::StartsWith("default-src 'self'; frame-ancestors 'self';"))
+            << request;
+        EXPECT_EQ(answer.Header("Strict-Transport-Security"),
+                  request == Get("/", over_tls) ? "max-age=31536000" : "");
+    }
+    EXPECT_EQ(test.Connect().Ask(Get("/own")).Header("Content-Security-Policy"),
+              "default-src 'none'");
+}
+
 TEST(Responder, AnswersFromAnotherThread) {
     Held held;
     TestServer test(held.handler());

@@ -112,34 +112,48 @@ TEST(PageRuntime, AnswersWhatIsNoPageWithoutMakingASession) {
 }
 
 TEST(PageRuntime, RefusesWhatAnotherSiteSends) {
+    const http::Header browser_name{"User-Agent", "Mozilla/5.0 (X11)"};
     const struct {
         const char* label;
-        bool post;
-        const char* event;
-        http::Header header;
+        const char* method;
+        const char* target;
+        std::vector<http::Header> headers;
         int status;
     } rows[] = {
-        {"own post", true, "Loe", {"Origin", "http://shop.example:8080"}, 200},
-        {"own post, letters", true, "Loe", {"Origin", "HTTP://Shop.Example:8080"}, 200},
-        {"old browser", true, "Loe", {"Accept", "*/*"}, 200},
-        {"own fetch", true, "Loe", {"Sec-Fetch-Site", "same-origin"}, 200},
-        {"foreign post", true, "Loe", {"Origin", "http://evil.example"}, 403},
-        {"foreign port", true, "Loe", {"Origin", "http://shop.example:81"}, 403},
-        {"no origin at all", true, "Loe", {"Origin", "null"}, 403},
-        {"post without an event", true, "", {"Sec-Fetch-Site", "cross-site"}, 403},
-        {"neighbour's post", true, "Loe", {"Sec-Fetch-Site", "same-site"}, 403},
-        {"foreign link to an event", false, "Loe", {"Sec-Fetch-Site", "cross-site"}, 403},
-        {"foreign link to a run-time event", false, "ID_1", {"Sec-Fetch-Site", "cross-site"}, 403},
-        {"foreign link to a page", false, "", {"Sec-Fetch-Site", "cross-site"}, 200},
-        {"typed address", false, "Loe", {"Sec-Fetch-Site", "none"}, 200},
+        {"own post", "POST", "Esimene&event=Loe", {{"Origin", "http://shop.example:8080"}}, 200},
+        {"letters", "POST", "Esimene&event=Loe", {{"Origin", "HTTP://Shop.Example:8080"}}, 200},
+        {"no browser", "POST", "Esimene&event=Loe", {{"Accept", "*/*"}}, 200},
+        {"own fetch", "POST", "Esimene&event=Loe", {{"Sec-Fetch-Site", "same-origin"}}, 200},
+        {"foreign post", "POST", "Esimene&event=Loe", {{"Origin", "http://evil.example"}}, 403},
+        {"port", "POST", "Esimene&event=Loe", {{"Origin", "http://shop.example:81"}}, 403},
+        {"no origin at all", "POST", "Esimene&event=Loe", {{"Origin", "null"}}, 403},
+        {"no event", "POST", "Esimene", {{"Sec-Fetch-Site", "cross-site"}}, 403},
+        {"neighbour", "POST", "Esimene&event=Loe", {{"Sec-Fetch-Site", "same-site"}}, 403},
+        {"unknown word", "POST", "Esimene&event=Loe", {{"Sec-Fetch-Site", "moon"}}, 403},
+        {"link to event", "GET", "Esimene&event=Loe", {{"Sec-Fetch-Site", "cross-site"}}, 403},
+        {"to run-time event", "GET", "Esimene&event=ID_1", {{"Sec-Fetch-Site", "cross-site"}}, 403},
+        {"link to a page", "GET", "Esimene", {{"Sec-Fetch-Site", "cross-site"}}, 200},
+        {"to a page that acts", "GET", "Teeb", {{"Sec-Fetch-Site", "cross-site"}}, 403},
+        {"own, to one that acts", "GET", "Teeb", {{"Sec-Fetch-Site", "same-origin"}}, 200},
+        {"typed address", "GET", "Esimene&event=Loe", {{"Sec-Fetch-Site", "none"}}, 200},
+        {"foreign referrer", "GET", "Teeb", {{"Referer", "http://evil.example/shop.example"}}, 403},
+        {"own referrer",
+         "GET",
+         "Teeb",
+         {browser_name, {"Referer", "http://shop.example:8080/a"}},
+         200},
+        {"silent browser", "GET", "Esimene&event=Loe", {browser_name}, 403},
+        {"silent, to a page", "GET", "Esimene", {browser_name}, 200},
+        {"typed in a browser", "GET", "Teeb", {browser_name, {"Sec-Fetch-Site", "none"}}, 200},
     };
     TestSite site;
     Browser browser(site);
     for (const auto& row : rows) {
-        const std::string target = std::string("/?page=Esimene&event=") + row.event;
-        const auto response =
-            row.post ? browser.Post(target, "", {row.header}) : browser.Get(target, {row.header});
-        EXPECT_EQ(response.status, row.status) << row.label;
+        http::Request request;
+        request.method = row.method;
+        request.target = std::string("/?page=") + row.target;
+        request.headers = row.headers;
+        EXPECT_EQ(browser.Send(std::move(request)).status, row.status) << row.label;
     }
 }
 
