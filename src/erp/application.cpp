@@ -77,10 +77,11 @@ std::int64_t Application::DefaultLink(std::string_view table, std::string_view l
     if (!target.FindColumn("IsDefault")) {
         return 0;
     }
-    const Lease connection = session()->database().pool().Read();
-    const auto row =
-        connection->Query({"SELECT min(ID) FROM " + target.name + " WHERE IsDefault = 1", {}});
-    return row->Next() ? row->GetInteger(0) : 0;
+    return session()->database().pool().Reading([&target](Connection& connection) {
+        const auto row =
+            connection.Query({"SELECT min(ID) FROM " + target.name + " WHERE IsDefault = 1", {}});
+        return row->Next() ? row->GetInteger(0) : 0;
+    });
 }
 
 const std::shared_ptr<Session>& Application::session() const {

@@ -1,14 +1,26 @@
 #include "erp/connection_pool.h"
 
+#include <algorithm>
+
 #include "base/runtime_error.h"
 
 namespace zebtell::erp {
 namespace {
 
-constexpr std::chrono::seconds kWriterWait{10};
-constexpr std::size_t kIdleReaders = 32;
+using std::chrono::steady_clock;
+
 // A look takes some 5 us; thousands of pages a second share it.
 constexpr std::chrono::milliseconds kLookTime{1};
+
+template <class Condition>
+void WaitFor(std::condition_variable& change,
+             std::unique_lock<std::mutex>& lock,
+             std::chrono::milliseconds limit,
+             const Condition& condition) {
+    if (!change.wait_until(lock, std::chrono::system_clock::now() + limit, condition)) {
+        throw base::RuntimeError(base::errors::kUnspecified, "The database is busy");
+    }
+}
 
 }  // namespace
 
@@ -16,78 +28,103 @@ Lease::~Lease() {
     if (!connection_) {
         return;  // moved away
     }
-    if (dropped_) {
+    if (dropped_ || connection_->IsBroken()) {
         connection_.reset();
     }
     pool_->Return(access_, std::move(connection_));
 }
 
 Lease ConnectionPool::Read() {
-    {
-        std::lock_guard lock(mutex_);
-        if (!readers_.empty()) {
-            Lease lease(*this, Access::kRead, std::move(readers_.back()));
-            readers_.pop_back();
-            return lease;
-        }
-    }
-    return Lease(*this, Access::kRead, backend_.Connect(Access::kRead));
+    Idle idle = TakeReader();
+    return {*this, Access::kRead, Ready(Access::kRead, std::move(idle))};
 }
 
 Lease ConnectionPool::Write() {
-    std::unique_ptr<Connection> connection;
-    {
-        std::unique_lock lock(mutex_);
-        const auto limit = std::chrono::system_clock::now() + kWriterWait;
-        if (!writer_back_.wait_until(lock, limit, [this] { return !writing_; })) {
-            throw base::RuntimeError(base::errors::kUnspecified, "The database is busy");
-        }
-        writing_ = true;
-        connection = std::move(writer_);
+    Idle idle = TakeWriter();
+    return {*this, Access::kWrite, Ready(Access::kWrite, std::move(idle))};
+}
+
+ConnectionPool::Idle ConnectionPool::TakeReader() {
+    std::unique_lock lock(mutex_);
+    WaitFor(reader_back_, lock, limits_.wait, [this] { return reading_ < limits_.readers; });
+    ++reading_;
+    if (readers_.empty()) {
+        return {};
     }
+    Idle idle = std::move(readers_.back());
+    readers_.pop_back();
+    return idle;
+}
+
+ConnectionPool::Idle ConnectionPool::TakeWriter() {
+    std::unique_lock lock(mutex_);
+    WaitFor(writer_back_, lock, limits_.wait, [this] { return !writing_; });
+    writing_ = true;
+    return std::move(writer_);
+}
+
+std::unique_ptr<Connection> ConnectionPool::Ready(Access access, Idle idle) {
     try {
-        if (!connection) {
-            connection = backend_.Connect(Access::kWrite);
+        if (idle.connection && steady_clock::now() - idle.since > limits_.trusted &&
+            !idle.connection->Answers()) {
+            idle.connection.reset();
         }
+        return idle.connection ? std::move(idle.connection) : backend_.Connect(access);
     } catch (...) {
-        Return(Access::kWrite, nullptr);
+        Return(access, nullptr);
         throw;
     }
-    return Lease(*this, Access::kWrite, std::move(connection));
 }
 
 void ConnectionPool::Return(Access access, std::unique_ptr<Connection> connection) {
     if (access == Access::kWrite) {
         ++writes_;
     }
+    const Time now = steady_clock::now();
+    std::vector<Idle> closed;  // without the lock, since it may take a while
     std::lock_guard lock(mutex_);
     if (access == Access::kWrite) {
-        writer_ = std::move(connection);
+        writer_ = {std::move(connection), now};
         writing_ = false;
         writer_back_.notify_one();
-    } else if (connection && readers_.size() < kIdleReaders) {
-        readers_.push_back(std::move(connection));
+        return;
+    }
+    --reading_;
+    reader_back_.notify_one();
+    const auto fresh = std::find_if(readers_.begin(), readers_.end(), [&](const Idle& idle) {
+        return now - idle.since < limits_.kept;
+    });
+    closed.assign(std::make_move_iterator(readers_.begin()), std::make_move_iterator(fresh));
+    readers_.erase(readers_.begin(), fresh);
+    if (connection) {
+        readers_.push_back({std::move(connection), now});
     }
 }
 
+void ConnectionPool::CloseIdle() {
+    std::vector<Idle> closed;
+    std::lock_guard lock(mutex_);
+    closed.swap(readers_);
+}
+
 std::int64_t ConnectionPool::DataVersion() {
-    const auto now = std::chrono::steady_clock::now();
+    const auto now = steady_clock::now();
     if (looked_writes_ == writes_ && now - looked_.load() < kLookTime) {
         return version_;
     }
     std::lock_guard lock(watch_mutex_);
     const std::int64_t writes = writes_;
-    std::unique_ptr<Connection> watcher = std::move(watcher_);  // gone when it fails
-    const bool is_new = !watcher;
+    std::unique_ptr<CommitWatch> watch = std::move(watch_);  // gone when it fails
+    const bool is_new = !watch;
     if (is_new) {
-        watcher = backend_.Connect(Access::kRead);
+        watch = backend_.WatchCommits();
     }
-    const std::int64_t seen = watcher->DataVersion();
-    if (is_new || seen != watched_) {
+    const std::int64_t seen = watch->DataVersion();
+    if (is_new || seen != watched_ || writes != looked_writes_) {
         watched_ = seen;
         ++version_;
     }
-    watcher_ = std::move(watcher);
+    watch_ = std::move(watch);
     looked_ = now;
     looked_writes_ = writes;
     return version_;

@@ -58,54 +58,57 @@ std::optional<std::string> NameInOtherCase(Connection& connection, std::string_v
     return std::nullopt;
 }
 
-std::optional<User> FindUser(CompanyDatabase& database, std::string_view name) {
-    const Lease connection = database.pool().Read();
-    std::optional<User> user = ReadUser(*connection, name);
+std::optional<User> FindUser(Connection& connection, std::string_view name) {
+    std::optional<User> user = ReadUser(connection, name);
     if (!user) {
-        const auto known = NameInOtherCase(*connection, name);
-        user = known ? ReadUser(*connection, *known) : std::nullopt;
+        const auto known = NameInOtherCase(connection, name);
+        user = known ? ReadUser(connection, *known) : std::nullopt;
     }
     return user;
 }
 
 // The lines of a list may be those of another one; whoever sees them reads them there.
-void AddSourceLists(CompanyDatabase& database, std::vector<std::int64_t>& lists) {
-    const Lease connection = database.pool().Read();
-    const std::size_t own = lists.size();
-    for (std::size_t i = 0; i < own; ++i) {
+std::vector<std::int64_t> WithSourceLists(Connection& connection,
+                                          const std::vector<std::int64_t>& own) {
+    std::vector<std::int64_t> lists = own;
+    for (const std::int64_t list : own) {
         const auto row =
-            connection->Query({"SELECT IDSrcPriceList FROM GRPriceList WHERE ID = ?", {lists[i]}});
+            connection.Query({"SELECT IDSrcPriceList FROM GRPriceList WHERE ID = ?", {list}});
         const std::int64_t source = row->Next() ? row->GetInteger(0) : 0;
         if (source != 0 && std::find(lists.begin(), lists.end(), source) == lists.end()) {
             lists.push_back(source);
         }
     }
+    return lists;
 }
 
 }  // namespace
 
 Reader LogOn(CompanyDatabase& database, std::string_view user, std::string_view password) {
-    const std::optional<User> found = FindUser(database, user);
+    const auto found = database.pool().Reading(
+        [user](Connection& connection) { return FindUser(connection, user); });
     const bool right = IsPassword(password, found ? found->hash : std::string());
     if (!right || found->disabled) {
         throw base::RuntimeError(base::errors::kLogonFailed, "Unknown user or wrong password");
     }
     Reader reader = found->reader;
-    reader.price_lists =
+    const auto lists =
         found->price_list != 0 ? std::vector{found->price_list} : DefaultPriceLists(database);
-    AddSourceLists(database, reader.price_lists);
+    reader.price_lists = database.pool().Reading(
+        [&lists](Connection& connection) { return WithSourceLists(connection, lists); });
     return reader;
 }
 
 std::vector<std::int64_t> DefaultPriceLists(CompanyDatabase& database) {
-    const Lease connection = database.pool().Read();
-    const auto row =
-        connection->Query({"SELECT ID FROM GRPriceList WHERE IsDefault = 1 ORDER BY ID", {}});
-    std::vector<std::int64_t> lists;
-    while (row->Next()) {
-        lists.push_back(row->GetInteger(0));
-    }
-    return lists;
+    return database.pool().Reading([](Connection& connection) {
+        const auto row =
+            connection.Query({"SELECT ID FROM GRPriceList WHERE IsDefault = 1 ORDER BY ID", {}});
+        std::vector<std::int64_t> lists;
+        while (row->Next()) {
+            lists.push_back(row->GetInteger(0));
+        }
+        return lists;
+    });
 }
 
 }  // namespace zebtell::erp

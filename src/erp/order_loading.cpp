@@ -67,9 +67,9 @@ std::shared_ptr<Order> NewOrder(const std::shared_ptr<Session>& session) {
 }
 
 std::shared_ptr<Order> LoadOrder(const std::shared_ptr<Session>& session, std::int64_t id) {
-    const Lease connection = session->database().pool().Read();
-    auto image =
-        ReadOrderImage(session->database().translator(), session->reader(), *connection, id);
+    auto image = session->database().pool().Reading([&](Connection& connection) {
+        return ReadOrderImage(session->database().translator(), session->reader(), connection, id);
+    });
     if (!image) {
         return nullptr;
     }

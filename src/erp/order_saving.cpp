@@ -91,10 +91,9 @@ void Saving::StoreNew() {
     if (order_.header.Integer("IDGRCompany") == 0) {
         Refuse("The order has no company");
     }
-    connection_.Execute(InsertSql(
+    stored_.id = connection_.Insert(InsertSql(
         "GDocument",
         {{"Kind", kOrderTable}, {"DocKey", order_.key}, {"Created", session_.clock()()}}));
-    stored_.id = connection_.LastIdentity();
     {
         const auto last = connection_.Query({"SELECT max(Number) FROM SDOrder", {}});
         stored_.number = (last->Next() ? last->GetInteger(0) : 0) + 1;
@@ -169,8 +168,7 @@ void Saving::StoreRows() {
         }
         values.emplace_back(kOrderRowLink, stored_.id);
         values.emplace_back("RowNo", row.fields.Get("RowNo"));
-        connection_.Execute(InsertSql(kOrderRowTable, values));
-        stored_.row_ids[i] = connection_.LastIdentity();
+        stored_.row_ids[i] = connection_.Insert(InsertSql(kOrderRowTable, values));
     }
 }
 
@@ -248,10 +246,9 @@ void SaveOrder(Order& order) {
         return;
     }
     Recalculate(order);
-    Transaction transaction(order.session()->database().pool());
-    Stored stored = Saving(order, transaction.connection()).Run();
-    transaction.Commit();
-    Take(order, std::move(stored));
+    Take(order, InTransaction(order.session()->database().pool(), [&order](Connection& connection) {
+             return Saving(order, connection).Run();
+         }));
 }
 
 }  // namespace zebtell::erp

@@ -82,9 +82,10 @@ std::shared_ptr<const Kept> Session::Shared(const std::string& key, Read&& read)
 
 template <class Read>
 auto Session::Run(const BoundSql& sql, Read&& read) {
-    const Lease connection = database_->pool().Read();
-    const auto cursor = connection->Query(sql);
-    return read(*cursor);
+    return database_->pool().Reading([&](Connection& connection) {
+        const auto cursor = connection.Query(sql);
+        return read(*cursor);
+    });
 }
 
 // Named users and guests may read different columns.

@@ -35,4 +35,24 @@ class Transaction {
     bool committed_ = false;
 };
 
+// The result of `work`(Connection&), run as one transaction: once more, from its beginning, when
+// the database has rolled it back in favour of another one.
+template <class Work>
+auto InTransaction(ConnectionPool& pool, const Work& work) {
+    const auto run = [&] {
+        Transaction transaction(pool);
+        auto result = work(transaction.connection());
+        transaction.Commit();
+        return result;
+    };
+    try {
+        return run();
+    } catch (const TransientError& error) {
+        if (error.kind() != TransientError::Kind::kDeadlock) {
+            throw;
+        }
+    }
+    return run();
+}
+
 }  // namespace zebtell::erp

@@ -25,7 +25,10 @@ class WatchedConnection : public Connection {
         watch_->Statement();
         inner_->Execute(sql);
     }
-    std::int64_t LastIdentity() override { return inner_->LastIdentity(); }
+    std::int64_t Insert(const BoundSql& sql) override {
+        watch_->Statement();
+        return inner_->Insert(sql);
+    }
     void Begin() override {
         watch_->Statement();
         inner_->Begin();
@@ -38,7 +41,8 @@ class WatchedConnection : public Connection {
         }
     }
     void Rollback() noexcept override { inner_->Rollback(); }
-    std::int64_t DataVersion() override { return inner_->DataVersion(); }
+    bool IsBroken() const override { return inner_->IsBroken(); }
+    bool Answers() override { return inner_->Answers(); }
 
   private:
     std::unique_ptr<Connection> inner_;
@@ -53,6 +57,7 @@ class WatchedBackend : public Backend {
     std::unique_ptr<Connection> Connect(Access access) override {
         return std::make_unique<WatchedConnection>(inner_->Connect(access), watch_);
     }
+    std::unique_ptr<CommitWatch> WatchCommits() override { return inner_->WatchCommits(); }
     DatabaseDescription Describe(Connection& connection) override {
         return inner_->Describe(connection);
     }

@@ -14,6 +14,7 @@ class SqliteBackend : public Backend {
         : path_(std::move(path)), limits_(limits) {}
 
     std::unique_ptr<Connection> Connect(Access access) override;
+    std::unique_ptr<CommitWatch> WatchCommits() override;
     DatabaseDescription Describe(Connection& connection) override;
     Dialect dialect() const override { return Dialect::kSqlite; }
 

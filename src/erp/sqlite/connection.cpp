@@ -15,7 +15,7 @@ constexpr const char* kReadingCache = "PRAGMA cache_size = -32000";
 
 class SqliteConnection::OpenCursor : public Cursor {
   public:
-    OpenCursor(StatementCache& cache, const BoundSql& sql)
+    OpenCursor(StatementCache<Statement>& cache, const BoundSql& sql)
         : cache_(cache), text_(sql.text), statement_(cache.Take(text_)) {
         statement_->Bind(sql.values);
     }
@@ -33,7 +33,7 @@ class SqliteConnection::OpenCursor : public Cursor {
     }
 
   private:
-    StatementCache& cache_;
+    StatementCache<Statement>& cache_;
     std::string text_;
     std::unique_ptr<Statement> statement_;
 };
@@ -45,7 +45,9 @@ SqliteConnection::SqliteConnection(const std::string& path,
     constexpr int kFlags = SQLITE_OPEN_READWRITE | SQLITE_OPEN_NOMUTEX | SQLITE_OPEN_EXRESCODE;
     try {
         Check(nullptr, sqlite3_open_v2(path.c_str(), &database_, kFlags, nullptr));
-        statements_ = std::make_unique<StatementCache>(database_);
+        statements_ = std::make_unique<StatementCache<Statement>>([this](const std::string& text) {
+            return std::make_unique<Statement>(database_, text);
+        });
         SetUp(access);
     } catch (...) {
         statements_.reset();
@@ -98,7 +100,8 @@ void SqliteConnection::Execute(const BoundSql& sql) {
     }
 }
 
-std::int64_t SqliteConnection::LastIdentity() {
+std::int64_t SqliteConnection::Insert(const BoundSql& sql) {
+    Execute(sql);
     return sqlite3_last_insert_rowid(database_);
 }
 

@@ -8,6 +8,7 @@
 
 #include "erp/connection.h"
 #include "erp/sqlite/statement.h"
+#include "erp/statement_cache.h"
 
 namespace zebtell::erp::sqlite {
 
@@ -26,11 +27,13 @@ class SqliteConnection : public Connection {
 
     std::unique_ptr<Cursor> Query(const BoundSql& sql) override;
     void Execute(const BoundSql& sql) override;
-    std::int64_t LastIdentity() override;
+    std::int64_t Insert(const BoundSql& sql) override;
     void Begin() override;
     void Commit() override;
     void Rollback() noexcept override;
-    std::int64_t DataVersion() override;
+
+    // Another number whenever other connections have committed something.
+    std::int64_t DataVersion();
 
   private:
     class OpenCursor;
@@ -41,7 +44,7 @@ class SqliteConnection : public Connection {
 
     ConnectionLimits limits_;
     sqlite3* database_ = nullptr;
-    std::unique_ptr<StatementCache> statements_;
+    std::unique_ptr<StatementCache<Statement>> statements_;
     std::chrono::steady_clock::time_point deadline_;
 };
 

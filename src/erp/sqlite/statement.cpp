@@ -5,11 +5,6 @@
 #include "erp/sqlite/errors.h"
 
 namespace zebtell::erp::sqlite {
-namespace {
-
-constexpr std::size_t kKeptStatements = 64;
-
-}  // namespace
 
 Statement::Statement(sqlite3* database, const std::string& text) : database_(database) {
     const char* rest = nullptr;
@@ -63,36 +58,6 @@ bool Statement::Step() {
         Fail(database_, code);
     }
     return false;
-}
-
-std::unique_ptr<Statement> StatementCache::Take(const std::string& text) {
-    const auto found = by_text_.find(text);
-    if (found == by_text_.end()) {
-        return std::make_unique<Statement>(database_, text);
-    }
-    auto statement = std::move(found->second->statement);
-    const auto kept = found->second;
-    by_text_.erase(found);
-    kept_.erase(kept);
-    return statement;
-}
-
-void StatementCache::Give(const std::string& text, std::unique_ptr<Statement> statement) {
-    statement->Reset();
-    if (by_text_.contains(text)) {
-        return;
-    }
-    kept_.push_front({text, std::move(statement)});
-    by_text_.emplace(kept_.front().text, kept_.begin());
-    if (kept_.size() > kKeptStatements) {
-        by_text_.erase(kept_.back().text);
-        kept_.pop_back();
-    }
-}
-
-void StatementCache::Clear() {
-    by_text_.clear();
-    kept_.clear();
 }
 
 }  // namespace zebtell::erp::sqlite
