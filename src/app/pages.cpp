@@ -17,7 +17,16 @@ namespace zebtell::app {
 namespace {
 
 using host::SessionState;
+using web::Effect;
+using web::Visitors;
 using web::Work;
+
+constexpr web::PageRules kEventsShow{.user_event = Effect::kShows};
+// Pages that stand open to everybody show a customer's data only inside tags that are empty for
+// nobody.
+constexpr web::PageRules kOpen{.visitors = Visitors::kEverybody};
+constexpr web::PageRules kOpenAndChanges{.visitors = Visitors::kEverybody,
+                                         .respond = Effect::kChanges};
 
 // For pages without tags of their own.
 void Shared_ProcessTag(SessionState& state, web::Call& call, markup::Tag& tag) {
@@ -36,32 +45,32 @@ std::vector<host::Page> PortalPages() {
     using namespace orders;
     return {
         {"Kaubainfo", "zebtell_kaubad.htm", Kaubainfo_Respond, Kaubainfo_ProcessTag, Kaubainfo_UserEvent,
-         {{"Favorites", Kaubainfo_Favorites, Work::kMayWait},
-          {"Hinnakiri", Kaubainfo_Hinnakiri, Work::kMayWait},
+         {{"Favorites", Kaubainfo_Favorites, Work::kMayWait, Effect::kShows},
+          {"Hinnakiri", Kaubainfo_Hinnakiri, Work::kMayWait, Effect::kShows},
           {"Lisamine", Kaubainfo_Lisamine},
           {"MuudaRead", Kaubainfo_MuudaRead},
-          {"Navigate", Kaubainfo_Navigate},
-          {"Otsing", Kaubainfo_Otsing, Work::kMayWait},
+          {"Navigate", Kaubainfo_Navigate, Work::kQuick, Effect::kShows},
+          {"Otsing", Kaubainfo_Otsing, Work::kMayWait, Effect::kShows},
           {"Tellimus", Kaubainfo_Tellimus},
-          {"UusTellimus", Kaubainfo_UusTellimus}}},
-        {"Kasutaja", "zebtell_kasutaja.htm", Kasutaja_Respond, Kasutaja_ProcessTag, nullptr, {}},
-        {"KInfo", "zebtell_info.htm", KInfo_Respond, KInfo_ProcessTag, KInfo_UserEvent, {}},
-        {"Kinnitatud", "zebtell_kinnitatud.htm", Kinnitatud_Respond, Kinnitatud_ProcessTag, Kinnitatud_UserEvent, {}},
+          {"UusTellimus", Kaubainfo_UusTellimus}}, kEventsShow},
+        {"Kasutaja", "zebtell_kasutaja.htm", Kasutaja_Respond, Kasutaja_ProcessTag, nullptr, {}, kOpen},
+        {"KInfo", "zebtell_info.htm", KInfo_Respond, KInfo_ProcessTag, KInfo_UserEvent, {}, kEventsShow},
+        {"Kinnitatud", "zebtell_kinnitatud.htm", Kinnitatud_Respond, Kinnitatud_ProcessTag, Kinnitatud_UserEvent, {}, kEventsShow},
         {"Kinnitus", "zebtell_koost2.htm", Kinnitus_Respond, Kinnitus_ProcessTag, Kinnitus_UserEvent,
          {{"LisaTellimus", Kinnitus_LisaTellimus, Work::kMayWait}}},
         {"Koostamine", "zebtell_koost1.htm", Koostamine_Respond, Koostamine_ProcessTag, Koostamine_UserEvent,
          {{"Vormista", Koostamine_Vormista}}},
         {"Lisamine", "zebtell_lisarida.htm", Lisamine_Respond, Lisamine_ProcessTag, Lisamine_UserEvent,
-         {{"Lisamine", Lisamine_Lisamine}}},
-        {"Lisatud", "zebtell_lisatud.htm", Lisatud_Respond, Shared_ProcessTag, nullptr, {}},
+         {{"Lisamine", Lisamine_Lisamine}}, kEventsShow},
+        {"Lisatud", "zebtell_lisatud.htm", Lisatud_Respond, Shared_ProcessTag, nullptr, {}, kOpen},
         {"Logon", "zebtell_logon.htm", Logon_Respond, Shared_ProcessTag, nullptr,
-         {{"Logon", Logon_Logon, Work::kMayWait}}},
+         {{"Logon", Logon_Logon, Work::kMayWait}}, kOpen},
         {"Logout", "zebtell_logout.htm", Logout_Respond, Shared_ProcessTag, nullptr,
-         {{"Hyperlink2", Logout_Hyperlink2}}, true},
-        {"Raamistik", "zebtell_frame.htm", Raamistik_Respond, Shared_ProcessTag, nullptr, {}},
-        {"Tellimus", "zebtell_tellimus.htm", Tellimus_Respond, Tellimus_ProcessTag, Tellimus_UserEvent, {}},
+         {{"Hyperlink2", Logout_Hyperlink2, Work::kQuick, Effect::kShows}}, kOpenAndChanges},
+        {"Raamistik", "zebtell_frame.htm", Raamistik_Respond, Shared_ProcessTag, nullptr, {}, kOpen},
+        {"Tellimus", "zebtell_tellimus.htm", Tellimus_Respond, Tellimus_ProcessTag, Tellimus_UserEvent, {}, kEventsShow},
         {"Vasak", "zebtell_vasak.htm", Vasak_Respond, Shared_ProcessTag, nullptr,
-         {{"Body1", Vasak_Body1}}},
+         {{"Body1", Vasak_Body1, Work::kQuick, Effect::kShows}}, kOpen},
         {"Yld", "zebtell_yld.htm", Yld_Respond, Shared_ProcessTag, nullptr, {}},
     };
 }

@@ -23,7 +23,6 @@ constexpr std::string_view kReadingFailed = "Probleem andmete lugemisel, proovig
 // a message.
 template <class Build>
 void BuildAndShow(SessionState& state, web::Call& call, std::string_view handler, Build&& build) {
-    if (!host::CheckLogon(state, call)) return;
     CatalogueState& catalogue = state.catalogue;
     std::string order = catalogue.OrderText;
     const auto work = [&] {
@@ -112,7 +111,6 @@ void Turn(SessionState& state,
           std::string_view handler,
           std::string_view command) {
     if (!state.catalogue.ListQuery) return Kaubainfo_Respond(state, call);
-    if (!host::CheckLogon(state, call)) return;
     host::Guarded(state, handler, [&] {
         if (!command.empty()) TurnPage(state.catalogue, command);
         RewindPage(state.catalogue);
@@ -123,7 +121,6 @@ void Turn(SessionState& state,
 }  // namespace
 
 void Kaubainfo_Respond(SessionState& state, web::Call& call) {
-    if (!host::CheckLogon(state, call)) return;
     CatalogueState& catalogue = state.catalogue;
     if (!catalogue.ListFresh) catalogue.PageNumber = 1;
     catalogue.ListFresh = false;
@@ -145,7 +142,6 @@ void Kaubainfo_ProcessTag(SessionState& state, web::Call& call, markup::Tag& tag
 
 void Kaubainfo_UserEvent(SessionState& state, web::Call& call, std::string_view event) {
     if (base::StartsWithNoCase(event, "ID_")) {
-        if (!host::CheckLogon(state, call)) return;
         host::Guarded(
             state, "Kaubainfo_UserEvent", [&] { ChooseRow(state, call, event.substr(3)); });
     } else {

@@ -35,7 +35,6 @@ bool Mode(tags::TagCall& c) {
 }  // namespace
 
 void KInfo_Respond(SessionState& state, web::Call& call) {
-    if (!host::CheckLogon(state, call)) return;
     state.Message.clear();
     host::ShowPage(state, call);
 }
@@ -45,7 +44,6 @@ void KInfo_ProcessTag(SessionState& state, web::Call& call, markup::Tag& tag) {
 }
 
 void KInfo_UserEvent(SessionState& state, web::Call& call, std::string_view) {
-    if (!host::CheckLogon(state, call)) return;
     const auto read = [&] {
         const std::string id = tags::CleanFormValue(call.request.Value("ID"));
         state.documents.Article = ReadArticle(state, id);

@@ -18,7 +18,6 @@ void ShowOrder(SessionState& state, web::Call& call) {
 }  // namespace
 
 void Tellimus_Respond(SessionState& state, web::Call& call) {
-    if (!host::CheckLogon(state, call)) return;
     host::Guarded(state, "Tellimus_Respond", [&] { tags::ReadShownOrder(state); });
     ShowOrder(state, call);
 }
@@ -29,7 +28,6 @@ void Tellimus_ProcessTag(SessionState& state, web::Call& call, markup::Tag& tag)
 }
 
 void Tellimus_UserEvent(SessionState& state, web::Call& call, std::string_view event) {
-    if (!host::CheckLogon(state, call)) return;
     const auto load = [&] {
         if (!base::StartsWithNoCase(event, "ID_")) return;
         state.documents.ShownOrder = {};

@@ -17,7 +17,6 @@ void Vasak_Body1(SessionState&, web::Call& call) {
 }
 
 void Yld_Respond(SessionState& state, web::Call& call) {
-    if (!CheckLogon(state, call)) return;
     OrErrorPage(state, call, [&] { call.WriteTemplate(); });
 }
 

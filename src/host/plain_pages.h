@@ -12,7 +12,7 @@ void Vasak_Respond(SessionState& state, web::Call& call);
 // The navigation's own link: the body frame's start page.
 void Vasak_Body1(SessionState& state, web::Call& call);
 
-// The one guarded plain page.
+// The one plain page that is for users.
 void Yld_Respond(SessionState& state, web::Call& call);
 
 }  // namespace zebtell::host

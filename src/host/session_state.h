@@ -65,8 +65,8 @@ NoCaseMap<std::string>& SessionDictionary(SessionState& state);
 // Ends the logged-on state: blocking cleared, every data object released. UserName stays.
 void ResetUserState(SessionState& state);
 
-// The guard of every page that needs a user: true when one is logged on, else the browser is sent
-// to the Logon page with a message and the handler writes nothing.
+// The guard of every page that needs a user, asked before its handlers run: true when one is logged
+// on, else the browser is sent to the Logon page with a message.
 bool CheckLogon(SessionState& state, web::Call& call);
 
 // The response is not to be kept by anybody.

@@ -67,7 +67,8 @@ web::WebClass<SessionState> WebClassHooks() {
             .EndRequest = WebClass_EndRequest,
             .FatalErrorResponse = WebClass_FatalErrorResponse,
             .Terminate = WebClass_Terminate,
-            .IsLoggedOn = [](const SessionState& state) { return state.logon.LoggedOn; }};
+            .IsLoggedOn = [](const SessionState& state) { return state.logon.LoggedOn; },
+            .CheckLogon = CheckLogon};
 }
 
 std::unique_ptr<SessionState> NewSession(Services& services) {

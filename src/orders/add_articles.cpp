@@ -60,7 +60,6 @@ void AddAll(SessionState& state,
 }  // namespace
 
 void Kaubainfo_Lisamine(SessionState& state, web::Call& call) {
-    if (!host::CheckLogon(state, call)) return;
     const auto work = [&] {
         tags::ReadCatalogueDeclarations(state, call);
         if (RefusesOrders(state, call)) return;

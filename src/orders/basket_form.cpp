@@ -136,7 +136,6 @@ void PressButtons(SessionState& state, web::Call& call) {
 // error shows the catalogue.
 template <class Work>
 void OnCatalogue(SessionState& state, web::Call& call, std::string_view handler, Work&& work) {
-    if (!host::CheckLogon(state, call)) return;
     state.catalogue.ListFresh = true;
     host::Guarded(state, handler, work, [&] { call.NextItem("Kaubainfo"); });
 }

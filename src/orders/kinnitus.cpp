@@ -86,7 +86,6 @@ void CopyStoredOrder(SessionState& state, std::string_view id) {
 }  // namespace
 
 void Kinnitus_Respond(SessionState& state, web::Call& call) {
-    if (!host::CheckLogon(state, call)) return;
     state.basket_form.BasketRowCursor = 1;
     state.basket_form.CurrentBasketRow.reset();
     host::ShowPage(state, call);
@@ -97,7 +96,6 @@ void Kinnitus_ProcessTag(SessionState& state, web::Call& call, markup::Tag& tag)
 }
 
 void Kinnitus_UserEvent(SessionState& state, web::Call& call, std::string_view event) {
-    if (!host::CheckLogon(state, call)) return;
     const auto work = [&] {
         if (base::EqualNoCase(event, "New")) {
             NewBasket(state);
@@ -115,7 +113,6 @@ void Kinnitus_UserEvent(SessionState& state, web::Call& call, std::string_view e
 }
 
 void Kinnitatud_Respond(SessionState& state, web::Call& call) {
-    if (!host::CheckLogon(state, call)) return;
     host::Guarded(state, "Kinnitatud_Respond", [&] { tags::ReadShownOrder(state); });
     tags::RewindOrderView(state);
     host::ShowPage(state, call);

@@ -75,7 +75,6 @@ bool Pressed(const web::Call& call, std::string_view button, std::string_view va
 }  // namespace
 
 void Koostamine_Respond(SessionState& state, web::Call& call) {
-    if (!host::CheckLogon(state, call)) return;
     state.basket_form.BasketRowCursor = 1;
     state.basket_form.CurrentBasketRow.reset();
     host::ShowPage(state, call);
@@ -87,7 +86,6 @@ void Koostamine_ProcessTag(SessionState& state, web::Call& call, markup::Tag& ta
 }
 
 void Koostamine_UserEvent(SessionState& state, web::Call& call, std::string_view event) {
-    if (!host::CheckLogon(state, call)) return;
     host::Guarded(state, "Koostamine_UserEvent", [&] {
         if (base::StartsWithNoCase(event, "DEL_")) DeleteRow(state, event.substr(4));
     });
@@ -98,7 +96,6 @@ void Koostamine_UserEvent(SessionState& state, web::Call& call, std::string_view
 }
 
 void Koostamine_Vormista(SessionState& state, web::Call& call) {
-    if (!host::CheckLogon(state, call)) return;
     const auto work = [&] {
         if (Pressed(call, "ZEB_But_LisaRidu", "Lisa ridu")) {
             call.RedirectTo("Kaubainfo");

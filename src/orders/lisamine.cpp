@@ -66,7 +66,6 @@ void AddRow(SessionState& state, const web::Call& call) {
 }  // namespace
 
 void Lisamine_Respond(SessionState& state, web::Call& call) {
-    if (!host::CheckLogon(state, call)) return;
     host::ShowPage(state, call);
 }
 
@@ -76,7 +75,6 @@ void Lisamine_ProcessTag(SessionState& state, web::Call& call, markup::Tag& tag)
 }
 
 void Lisamine_UserEvent(SessionState& state, web::Call& call, std::string_view event) {
-    if (!host::CheckLogon(state, call)) return;
     host::Guarded(state, "Lisamine_UserEvent", [&] {
         if (!base::StartsWithNoCase(event, "ID_")) return;
         state.basket_form.RowToAdd.reset();
@@ -88,7 +86,6 @@ void Lisamine_UserEvent(SessionState& state, web::Call& call, std::string_view e
 }
 
 void Lisamine_Lisamine(SessionState& state, web::Call& call) {
-    if (!host::CheckLogon(state, call)) return;
     const auto work = [&] {
         if (RefusesOrders(state, call)) return call.RedirectTo("Lisamine");
         AddRow(state, call);

@@ -103,7 +103,6 @@ void PressButton(SessionState& state, web::Call& call) {
 }  // namespace
 
 void Kinnitus_LisaTellimus(SessionState& state, web::Call& call) {
-    if (!host::CheckLogon(state, call)) return;
     std::string problem;
     const auto work = [&] {
         try {

@@ -13,11 +13,28 @@ namespace zebtell::web {
 // a database on the network) and so may not run on an IO thread.
 enum class Work { kQuick, kMayWait };
 
+// Who may ask for a page: without a log-on nobody reaches a handler or a tag of a page that is for
+// kLoggedOn.
+enum class Visitors { kLoggedOn, kEverybody };
+
+// Whether a request only shows something or changes what the user owns: his basket, his orders,
+// his log-on. A request that changes something is refused when another site sent it, and a post
+// always counts as one.
+enum class Effect { kShows, kChanges };
+
 template <class State>
 struct PageEvent {
     std::string_view name;
     void (*handle)(State&, Call&);
     Work work = Work::kQuick;
+    Effect effect = Effect::kChanges;
+};
+
+// The defaults are the strict ones, so that a forgotten word refuses too much.
+struct PageRules {
+    Visitors visitors = Visitors::kLoggedOn;
+    Effect respond = Effect::kShows;
+    Effect user_event = Effect::kChanges;
 };
 
 // One page: its name, its template and its handlers. State is what a session holds.
@@ -31,9 +48,7 @@ struct Page {
     // For event names made at run time. Null: such events show the page's template.
     void (*UserEvent)(State&, Call&, std::string_view event) = nullptr;
     std::vector<PageEvent<State>> events;
-    // Whether Respond changes something, so that links from other sites are refused as they are for
-    // events.
-    bool RespondActs = false;
+    PageRules rules = {};
 };
 
 // What the runtime raises on the application around the pages.
@@ -47,6 +62,9 @@ struct WebClass {
     void (*FatalErrorResponse)(State&, Call&, const std::exception& error, bool& SendDefault);
     void (*Terminate)(State&);
     bool (*IsLoggedOn)(const State&);
+    // For pages that are for kLoggedOn: whether the request may go on. When not, the response is
+    // written. Null: everybody may.
+    bool (*CheckLogon)(State&, Call&) = nullptr;
 };
 
 }  // namespace zebtell::web

@@ -36,11 +36,11 @@ class StateInstance final : public SessionInstance {
 };
 
 // `function` with its State& taken from the instance; empty for null.
-template <class State, class... Args>
-std::function<void(SessionInstance&, Args...)> OnInstance(void (*function)(State&, Args...)) {
+template <class State, class Result, class... Args>
+std::function<Result(SessionInstance&, Args...)> OnInstance(Result (*function)(State&, Args...)) {
     if (function == nullptr) return nullptr;
     return [function](SessionInstance& instance, Args... args) {
-        function(StateInstance<State>::Of(instance), std::forward<Args>(args)...);
+        return function(StateInstance<State>::Of(instance), std::forward<Args>(args)...);
     };
 }
 
@@ -56,9 +56,11 @@ Site MakeSite(const std::vector<Page<State>>& table,
                       .process_tag = OnInstance(row.ProcessTag),
                       .user_event = OnInstance(row.UserEvent),
                       .events = {},
-                      .respond_acts = row.RespondActs};
-        for (const PageEvent<State>& event : row.events)
-            page.events.push_back({std::string(event.name), OnInstance(event.handle), event.work});
+                      .rules = row.rules};
+        for (const PageEvent<State>& event : row.events) {
+            page.events.push_back(
+                {std::string(event.name), OnInstance(event.handle), event.work, event.effect});
+        }
         pages.push_back(std::move(page));
     }
     SiteHooks hooks{.make_instance =
@@ -69,7 +71,8 @@ Site MakeSite(const std::vector<Page<State>>& table,
                     .start = OnInstance(web_class.Start),
                     .end_request = OnInstance(web_class.EndRequest),
                     .fatal = OnInstance(web_class.FatalErrorResponse),
-                    .is_logged_on = nullptr};
+                    .is_logged_on = nullptr,
+                    .check_logon = OnInstance(web_class.CheckLogon)};
     if (web_class.IsLoggedOn != nullptr) {
         hooks.is_logged_on = [is_logged_on =
                                   web_class.IsLoggedOn](const SessionInstance& instance) {

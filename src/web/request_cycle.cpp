@@ -45,7 +45,7 @@ class Cycle {
             if (hooks_.start) hooks_.start(instance_, call_);
         } else {
             Enter(call_.request.page);
-            Raise(call_.request.event);
+            if (Admits()) Raise(call_.request.event);
         }
         FollowNextItems();
     }
@@ -79,13 +79,18 @@ class Cycle {
             if (hops == kMaxNextItems)
                 throw base::RuntimeError(base::errors::kInvalidCall, "Too many next items");
             Enter(call_.TakeNextItem());
-            Respond();
+            if (Admits()) Respond();
         }
     }
 
     void Enter(std::string_view name) {
         page_ = &Known(name);
         call_.SetPage(page_->name);
+    }
+
+    bool Admits() {
+        if (page_->rules.visitors == Visitors::kEverybody || !hooks_.check_logon) return true;
+        return hooks_.check_logon(instance_, call_);
     }
 
     const SitePage& Known(std::string_view name) const {

@@ -23,6 +23,12 @@ const SiteEvent* SitePage::FindEvent(std::string_view event) const {
     return nullptr;
 }
 
+Effect SitePage::EffectOf(std::string_view event) const {
+    if (event.empty()) return rules.respond;
+    const SiteEvent* custom = FindEvent(event);
+    return custom == nullptr ? rules.user_event : custom->effect;
+}
+
 Site::Site(std::vector<SitePage> pages, SiteHooks hooks)
     : pages_(std::move(pages)), hooks_(std::move(hooks)) {
     for (const SitePage& page : pages_) {

@@ -30,6 +30,7 @@ struct SiteEvent {
     std::string name;
     std::function<void(SessionInstance&, Call&)> handle;
     Work work = Work::kQuick;
+    Effect effect = Effect::kChanges;
 };
 
 struct SitePage {
@@ -39,9 +40,10 @@ struct SitePage {
     std::function<void(SessionInstance&, Call&, markup::Tag&)> process_tag;
     std::function<void(SessionInstance&, Call&, std::string_view event)> user_event;
     std::vector<SiteEvent> events;
-    bool respond_acts = false;
+    PageRules rules = {};
 
     const SiteEvent* FindEvent(std::string_view event) const;
+    Effect EffectOf(std::string_view event) const;  // "": of Respond
 };
 
 struct SiteHooks {
@@ -51,6 +53,7 @@ struct SiteHooks {
     std::function<void(SessionInstance&, Call&)> end_request;
     std::function<void(SessionInstance&, Call&, const std::exception&, bool& send_default)> fatal;
     std::function<bool(const SessionInstance&)> is_logged_on;
+    std::function<bool(SessionInstance&, Call&)> check_logon;
 };
 
 class Site {

@@ -22,9 +22,9 @@ RuntimeOptions Checked(RuntimeOptions options) {
     return options;
 }
 
-bool MayChangeState(const Request& request, const SitePage* page) {
-    return request.method == "POST" || !request.event.empty() ||
-           (page != nullptr && page->respond_acts);
+bool Changes(const Request& request, const SitePage* page) {
+    return request.method == "POST" ||
+           (page != nullptr && page->EffectOf(request.event) == Effect::kChanges);
 }
 
 }  // namespace
@@ -68,7 +68,7 @@ void SiteRuntime::Handle(const http::Request& request, http::Responder respond) 
     Request& page_request = std::get<Request>(parsed);
     const SitePage* page = site_.Find(page_request.page);
     if (page == nullptr && !page_request.page.empty()) return respond(PlainPage(404));
-    if (MayChangeState(page_request, page) && IsCrossSite(request)) return respond(PlainPage(403));
+    if (Changes(page_request, page) && IsCrossSite(request)) return respond(PlainPage(403));
 
     auto job = std::make_shared<Job>();
     job->session = SessionFor(request, job->new_token);

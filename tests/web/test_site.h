@@ -124,7 +124,7 @@ inline std::vector<Page<TestState>> TestPages() {
         {"Mall", "teine.htm", nullptr, nullptr, Esimene_UserEvent, {{"Vaikne", Esimene_Vaikne}}},
         {"Ring", "teine.htm", Ring_Respond, nullptr, nullptr, {}},
         {"Mujale", "teine.htm", Mujale_Respond, nullptr, nullptr, {}},
-        {"Teeb", "teine.htm", Teine_Respond, nullptr, nullptr, {}, true},
+        {"Teeb", "teine.htm", Teine_Respond, nullptr, nullptr, {}, {.respond = Effect::kChanges}},
         {"Puudu", "missing.htm", nullptr, nullptr, nullptr, {}},
         {"Halb", "halb.htm", nullptr, Esimene_ProcessTag, nullptr, {}},
     };
