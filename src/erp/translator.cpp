@@ -1,5 +1,6 @@
 #include "erp/translator.h"
 
+#include <algorithm>
 #include <utility>
 
 #include "base/text.h"
@@ -71,19 +72,12 @@ class TableSelect {
 
     // By the key at last, so that the order is always the same.
     void AddOrder(std::string_view order) {
-        bool by_key = false;
-        order_.text = " order by ";
         if (!order.empty()) {
             for (const sql::OrderItem& item : sql::Parser(order, Style::kFilter).ParseOrderList()) {
-                by_key = AddOrderItem(item) || by_key;
-                order_.text += ", ";
+                AddOrderItem(item);
             }
         }
-        if (by_key) {
-            order_.text.resize(order_.text.size() - 2);
-        } else {
-            PrintPath(PathOf("ID"), order_);
-        }
+        AddOrderPath(PathOf("ID"), false);
     }
 
     BoundSql Statement() {
@@ -105,16 +99,24 @@ class TableSelect {
         sql::PrintColumn(context_, context_.names.Resolve(path, scope_, nullptr), out);
     }
 
-    // Whether it is the key.
-    bool AddOrderItem(const sql::OrderItem& item) {
+    void AddOrderItem(const sql::OrderItem& item) {
         const auto* path = std::get_if<sql::Path>(&item.expression->node);
         if (!path) {
             sql::Fail("An order is columns or paths, separated by commas");
         }
-        const auto column = context_.names.Resolve(*path, scope_, nullptr);
-        sql::PrintColumn(context_, column, order_);
-        order_.text += item.descending ? " desc" : "";
-        return column.source == &source_ && base::EqualNoCase(column.name, "ID");
+        AddOrderPath(*path, item.descending);
+    }
+
+    // A column that stands there again means nothing, and SQL Server refuses it.
+    void AddOrderPath(const sql::Path& path, bool descending) {
+        BoundSql column;
+        PrintPath(path, column);
+        if (std::find(ordered_.begin(), ordered_.end(), column.text) != ordered_.end()) {
+            return;
+        }
+        order_.text += ordered_.empty() ? " order by " : ", ";
+        order_.text += column.text + (descending ? " desc" : "");
+        ordered_.push_back(std::move(column.text));
     }
 
     Context context_;
@@ -123,40 +125,64 @@ class TableSelect {
     BoundSql items_;
     BoundSql where_;
     BoundSql order_;
+    std::vector<std::string> ordered_;  // the columns in order_
     std::string_view glue_ = " where ";
 };
 
+ServerSqlWatcher& Watcher() {
+    static ServerSqlWatcher watcher;
+    return watcher;
+}
+
 }  // namespace
+
+void WatchServerSql(ServerSqlWatcher watcher) {
+    Watcher() = std::move(watcher);
+}
+
+template <class Make>
+BoundSql Translator::Made(const Make& make) const {
+    if (Watcher() && dialect_ != Dialect::kSqlServer) {
+        Watcher()(make(Dialect::kSqlServer));
+    }
+    return make(dialect_);
+}
 
 BoundSql Translator::ListKeys(const Reader& reader,
                               std::string_view table,
                               std::string_view filter,
                               std::string_view order,
                               std::span<const std::string> columns) const {
-    TableSelect select(schema_, dialect_, reader, table);
-    select.AddFields(columns);
-    select.AddCondition(ConditionOf(filter));
-    select.AddOrder(base::Trimmed(order));
-    return select.Statement();
+    return Made([&](Dialect dialect) {
+        TableSelect select(schema_, dialect, reader, table);
+        select.AddFields(columns);
+        select.AddCondition(ConditionOf(filter));
+        select.AddOrder(base::Trimmed(order));
+        return select.Statement();
+    });
 }
 
 BoundSql Translator::RowsByID(const Reader& reader,
                               std::string_view table,
                               std::span<const std::int64_t> ids,
                               std::span<const std::string> fields) const {
-    TableSelect select(schema_, dialect_, reader, table);
-    select.AddFields(fields);
-    select.AddIDs(ids);
-    return select.Statement();
+    return Made([&](Dialect dialect) {
+        TableSelect select(schema_, dialect, reader, table);
+        select.AddFields(fields);
+        select.AddIDs(ids);
+        return select.Statement();
+    });
 }
 
 BoundSql Translator::Select(const Reader& reader, std::string_view sql) const {
     const sql::SelectPtr select = sql::Parser(sql, Style::kStatement).ParseStatement();
     sql::NarrowSubqueries(*select);
-    Context context(schema_, dialect_, reader, Style::kStatement);
-    BoundSql out;
-    sql::PrintSelect(context, *select, nullptr, sql::SelectUse::kResult, out);
-    return out;
+    return Made([&](Dialect dialect) {
+        Context context(schema_, dialect, reader, Style::kStatement);
+        BoundSql out;
+        sql::PrintSelect(context, *select, nullptr, sql::SelectUse::kResult, out);
+        return out;
+    });
 }
 
 std::vector<std::string> Translator::ReadableColumns(const Reader& reader,

@@ -28,16 +28,17 @@ const StatementRow kStatements[] = {
      "nvarchar(4000)) as Column2, cast((t1.ID + ? + ?) as nvarchar(4000)) + t1.Code as Column3 "
      "from GRArticle t1 where t1.ID = ? <- a, 1, 1, 2, 1",
      "aM6-201|M6-201|4M6-20"},
-    {"select 7/2, 7/2/2, 7.0/2, ID/2, (ID+1)/2*3, 7%4, 1/0, 5/ID/2 from GRArticle where ID=1",
+    {"select 7/2, 7/2/2, 7.5/2, ID/2, (ID+1)/2*3, 7%4, 1/0, 5/ID/2 from GRArticle where ID=1",
      "select ? / ? as Column1, ? / ? / ? as Column2, erp_div(?, ?) as Column3, erp_div(t1.ID, ?) "
      "as Column4, erp_div((t1.ID + ?), ?) * ? as Column5, ? % ? as Column6, ? / ? as Column7, "
      "erp_div(erp_div(?, t1.ID), ?) as Column8 from GRArticle t1 where t1.ID = ? <- 7, 2, 7, 2, "
-     "2, 7, 2, 2, 1, 2, 3, 7, 4, 1, 0, 5, 2, 1",
-     "select ? / ? as Column1, ? / ? / ? as Column2, ? / ? as Column3, t1.ID / ? as Column4, "
-     "(t1.ID + ?) / ? * ? as Column5, ? % ? as Column6, ? / ? as Column7, ? / t1.ID / ? as "
-     "Column8 from GRArticle t1 where t1.ID = ? <- 7, 2, 7, 2, 2, 7, 2, 2, 1, 2, 3, 7, 4, 1, 0, "
-     "5, 2, 1",
-     "3|1|3.5|0.5|3|3||2.5"},
+     "2, 7.5, 2, 2, 1, 2, 3, 7, 4, 1, 0, 5, 2, 1",
+     "select ? / nullif(?, 0) as Column1, ? / nullif(?, 0) / nullif(?, 0) as Column2, 7.5 * 1.0 / "
+     "nullif(?, 0) as Column3, t1.ID * 1.0 / nullif(?, 0) as Column4, (t1.ID + ?) * 1.0 / "
+     "nullif(?, 0) * ? as Column5, ? % nullif(?, 0) as Column6, ? / nullif(?, 0) as Column7, ? * "
+     "1.0 / nullif(t1.ID, 0) * 1.0 / nullif(?, 0) as Column8 from GRArticle t1 where t1.ID = ? <- "
+     "7, 2, 7, 2, 2, 2, 2, 1, 2, 3, 7, 4, 1, 0, 5, 2, 1",
+     "3|1|3.75|0.5|3|3||2.5"},
     {"select -ID, - -3, ID - -3, -(-ID), +5 from GRArticle where ID=1",
      "select -(t1.ID) as Column1, ? as Column2, t1.ID - ? as Column3, -(-(t1.ID)) as Column4, ? as "
      "Column5 from GRArticle t1 where t1.ID = ? <- 3, -3, 5, 1",
@@ -48,9 +49,9 @@ const StatementRow kStatements[] = {
      "select distinct case when t1.ID > 2 then 'x''y' else 'z' end as k, count(*) as Column2 from "
      "GRArticle t1 group by case when t1.ID > 2 then 'x''y' else 'z' end having count(*) > 1 order "
      "by k",
-     "select distinct case when t1.ID > 2 then N'x''y' else N'z' end as k, count(*) as Column2 "
-     "from GRArticle t1 group by case when t1.ID > 2 then N'x''y' else N'z' end having count(*) > "
-     "1 order by k",
+     "select distinct case when t1.ID > 2 then N'x''y' else N'z' end as k, count_big(*) as Column2 "
+     "from GRArticle t1 group by case when t1.ID > 2 then N'x''y' else N'z' end having "
+     "count_big(*) > 1 order by k",
      "x'y|2;z|2"},
     {"select o.Number, sum(r.Quantity) [the sum] from dbo.SDOrder o with (nolock) left outer join "
      "SDOrderRow r on r.IDSDOrder=o.ID and r.Quantity>2 group by o.Number order by o.Number desc",
@@ -109,15 +110,17 @@ const StatementRow kStatements[] = {
      "t2.Price > ?)) <- %100\\\\%%, %[new] _ %, [20,10], 100",
      "select t1.ID as ID from GRArticle t1 where (t1.Name like ? escape '\\' or t1.Name like ? "
      "escape '\\' or exists (select t2.ID, t2.IDGRPriceList, t2.IDGRArticle, t2.Price from "
-     "GRPriceListRel t2 where t2.IDGRPriceList in (select cast(value as bigint) from openjson(?)) "
-     "and t2.IDGRArticle = t1.ID and t2.Price > ?)) <- %100\\\\%%, %\\[new] _ %, [20,10], 100",
+     "GRPriceListRel t2 where t2.IDGRPriceList in (select value from openjson(?) with (value "
+     "bigint '$')) and t2.IDGRArticle = t1.ID and t2.Price > ?)) <- %100\\\\%%, %\\[new] _ %, "
+     "[20,10], 100",
      "4"},
     {"select ID from GRArticle where Code in (10, 20) or Code in ('V100', 'x') or ID in () or "
      "ID in (1+1) order by ID",
      nullptr,
-     "select t1.ID as ID from GRArticle t1 where (t1.Code in (select value from openjson(?)) or "
-     "t1.Code in (?, ?) or t1.ID in (select cast(value as bigint) from openjson(?)) or t1.ID in "
-     "((? + ?))) order by t1.ID <- [10,20], V100, x, [], 1, 1",
+     "select t1.ID as ID from GRArticle t1 where (t1.Code in (select cast(value as nvarchar(20)) "
+     "from openjson(?) with (value bigint '$')) or t1.Code in (?, ?) or t1.ID in (select value "
+     "from openjson(?) with (value bigint '$')) or t1.ID in ((? + ?))) order by t1.ID <- [10,20], "
+     "V100, x, [], 1, 1",
      "2;3"},
     {"select x.n, (select max(Price) from GRPriceListRel where IDGRArticle=x.k) from (select top 2 "
      "Name n, ID as k from GRArticle order by ID desc) x order by x.k",
@@ -125,11 +128,32 @@ const StatementRow kStatements[] = {
      "(select value from json_each(?)) and t3.IDGRArticle = t2.k) as Column2 from (select t1.Name "
      "as n, t1.ID as k from GRArticle t1 order by t1.ID desc limit 2) t2 order by t2.k <- [20,10]",
      "select t2.n as n, (select max(t3.Price) from GRPriceListRel t3 where t3.IDGRPriceList in "
-     "(select cast(value as bigint) from openjson(?)) and t3.IDGRArticle = t2.k) as Column2 from "
+     "(select value from openjson(?) with (value bigint '$')) and t3.IDGRArticle = t2.k) as "
+     "Column2 from "
      "(select top (2) t1.Name as n, t1.ID as k from GRArticle t1 order by t1.ID desc) t2 order by "
      "t2.k <- [20,10]",
      "Värv 100% õli|12;It's [new] \\ odd|"},
     {"select count(distinct IDGRTax) from GRArticle", nullptr, nullptr, "2"},
+    {"select Number, DocDate + ' ' + Number, avg(ID) from SDOrder where Explanation like 'min_' "
+     "and "
+     "round(Amount * 0.5, 1)=5 group by Number, DocDate order by Number, number desc",
+     "select t1.Number as Number, t1.DocDate || ' ' || t1.Number as Column2, avg(t1.ID) as Column3 "
+     "from SDOrder t1 where t1.IDGRCompany = ? and erp_like(t1.Explanation, ?) and "
+     "erp_round(t1.Amount * ?, 1) = ? group by t1.Number, t1.DocDate order by t1.Number <- 1, "
+     "min_, 0.5, 5",
+     "select t1.Number as Number, replace(convert(nvarchar(19), t1.DocDate, 120), N' 00:00:00', "
+     "N'') + N' ' + cast(t1.Number as nvarchar(4000)) as Column2, avg(t1.ID * 1.0) as Column3 from "
+     "SDOrder t1 where t1.IDGRCompany = ? and rtrim(t1.Explanation) like ? escape '\\' and "
+     "round(cast(t1.Amount * 0.5 as decimal(28, 10)), 1) = ? group by t1.Number, t1.DocDate order "
+     "by t1.Number <- 1, min_, 5",
+     "1|2026-11-20 1|100"},
+    {"select 1 [user], x.[percent] from (select ID [percent] from GRTax with (nolock)) x "
+     "with (nolock) where x.[percent]=2",
+     "select ? as \"user\", t2.\"percent\" as \"percent\" from (select t1.ID as \"percent\" from "
+     "GRTax t1) t2 where t2.\"percent\" = ? <- 1, 2",
+     "select ? as [user], t2.[percent] as [percent] from (select t1.ID as [percent] from GRTax t1 "
+     "with (nolock)) t2 where t2.[percent] = ? <- 1, 2",
+     "1|2"},
 };
 
 TEST(StatementTest, PrintedForBothDatabases) {

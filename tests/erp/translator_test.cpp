@@ -24,7 +24,7 @@ const ListRow kPriceLines[] = {
     {"another customer's line", "ID=7", "", " and t1.ID = ? order by t1.ID <- [20,10], 7", ""},
     {"order by key",
      "",
-     "Price desc, ID desc",
+     "Price desc, ID desc, price",
      " order by t1.Price desc, t1.ID desc <- [20,10]",
      "3;1;2"},
     {"favourites of a list",
@@ -269,17 +269,18 @@ TEST(TranslatorTest, PriceQueryOfBothDatabases) {
     EXPECT_EQ(Shown(server.Select(FirstCustomer(), kPriceQuery)),
               "select t1.ID as ID, t1.IDGRPriceList as IDGRPriceList, t1.IDSrcPriceList as "
               "IDSrcPriceList, t1.IDGRArticle as IDGRArticle, t1.Price as Price, t5.idgrcompany as "
-              "idgrcompany, isnull(t5.PriceCut, ?) as pricecut, round(t1.Price * (? + "
-              "isnull(t5.PriceCut, ?)), 0) / ? as finalprice from SQPriceList5 t1 with (nolock) "
-              "left join (select t2.PriceCut as PriceCut, t2.IDGRPriceList as IDGRPriceList, t4.ID "
-              "as idgrcompany, t3.ID as idgrarticle from GRPriceCatRel t2 with (nolock) inner join "
-              "GRArticle t3 with (nolock) on t3.IDGRArticlePriceCat = t2.IDGRArticlePriceCat inner "
-              "join GRCompany t4 with (nolock) on t4.IDGRCompanyPriceCat = t2.IDGRCompanyPriceCat "
-              "and t4.ID in (?, ?, ?) where t2.IDGRCompanyPriceCat = ? and t4.ID = ? and t3.ID in "
-              "(select cast(value as bigint) from openjson(?))) t5 on t1.IDGRArticle = "
-              "t5.idgrarticle and t1.IDSrcPriceList = t5.IDGRPriceList where t1.IDGRPriceList in "
-              "(select cast(value as bigint) from openjson(?)) and t1.IDGRPriceList = ? and "
-              "t1.IDGRArticle in (select cast(value as bigint) from openjson(?))" +
+              "idgrcompany, isnull(t5.PriceCut, ?) as pricecut, round(cast(t1.Price * (? + "
+              "isnull(t5.PriceCut, ?)) as decimal(28, 10)), 0) * 1.0 / nullif(?, 0) as finalprice "
+              "from SQPriceList5 t1 with (nolock) left join (select t2.PriceCut as PriceCut, "
+              "t2.IDGRPriceList as IDGRPriceList, t4.ID as idgrcompany, t3.ID as idgrarticle from "
+              "GRPriceCatRel t2 with (nolock) inner join GRArticle t3 with (nolock) on "
+              "t3.IDGRArticlePriceCat = t2.IDGRArticlePriceCat inner join GRCompany t4 with "
+              "(nolock) on t4.IDGRCompanyPriceCat = t2.IDGRCompanyPriceCat and t4.ID in (?, ?, ?) "
+              "where t2.IDGRCompanyPriceCat = ? and t4.ID = ? and t3.ID in (select value from "
+              "openjson(?) with (value bigint '$'))) t5 on t1.IDGRArticle = t5.idgrarticle and "
+              "t1.IDSrcPriceList = t5.IDGRPriceList where t1.IDGRPriceList in (select value from "
+              "openjson(?) with (value bigint '$')) and t1.IDGRPriceList = ? and t1.IDGRArticle in "
+              "(select value from openjson(?) with (value bigint '$'))" +
                   values);
 }
 
@@ -308,6 +309,15 @@ TEST(TranslatorTest, LongListsAreOneValue) {
         "t1.ID in (select value from json_each(?))");
     EXPECT_EQ(sql.values, std::vector<base::Value>{"[" + list + "]"});
     EXPECT_EQ(Database().Run(sql), "1|Full|22;2|Half|9");
+
+    std::string codes = "'V100'";
+    for (int i = 1; i < 3000; ++i) {
+        codes += ",'" + std::to_string(i) + "'";
+    }
+    const BoundSql texts = Database().translator().Select(
+        FirstCustomer(), "SELECT ID FROM GRArticle WHERE Code IN (" + codes + ")");
+    EXPECT_TRUE(texts.values.empty()) << texts.values.size();
+    EXPECT_EQ(Database().Run(texts), "3");
 }
 
 TEST(TranslatorTest, ReadableColumnsLeaveHiddenOnesOut) {

@@ -6,6 +6,7 @@
 #include "base/text.h"
 #include "erp/sql/errors.h"
 #include "erp/sql/keywords.h"
+#include "erp/sql/server_words.h"
 
 namespace zebtell::erp::sql {
 namespace {
@@ -17,7 +18,7 @@ bool IsPlain(std::string_view name) {
         return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z') || c == '_';
     };
     return is_letter(name.front()) && KeywordOf(name) == Keyword::kNone &&
-           std::all_of(name.begin(), name.end(), [&](char c) {
+           !IsReservedOnServer(name) && std::all_of(name.begin(), name.end(), [&](char c) {
                return is_letter(c) || (c >= '0' && c <= '9');
            });
 }
@@ -72,13 +73,15 @@ void AppendTextLiteral(BoundSql& out, std::string_view text, Dialect dialect) {
 void AppendInJson(BoundSql& out, std::string json, Dialect dialect, bool as_text) {
     if (dialect == Dialect::kSqlite) {
         out.text += " in (select value from json_each(";
-    } else if (as_text) {
-        out.text += " in (select value from openjson(";
-    } else {
-        out.text += " in (select cast(value as bigint) from openjson(";
+        AppendValue(out, std::move(json));
+        out.text += "))";
+        return;
     }
+    // Texts made of numbers take the collation of what they are compared with.
+    out.text += as_text ? " in (select cast(value as nvarchar(20))" : " in (select value";
+    out.text += " from openjson(";
     AppendValue(out, std::move(json));
-    out.text += "))";
+    out.text += ") with (value bigint '$'))";
 }
 
 }  // namespace zebtell::erp::sql

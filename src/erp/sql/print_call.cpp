@@ -58,7 +58,7 @@ ValueType Computed(ValueType type) {
 
 ValueType PrintCall(Context& context, const Call& call, Scope& scope, BoundSql& out) {
     if (call.star) {
-        out.text += "count(*)";
+        out.text += context.dialect == Dialect::kSqlite ? "count(*)" : "count_big(*)";
         return ValueType::kNumber;
     }
     const std::string_view pattern = call.function->Print(context.dialect);

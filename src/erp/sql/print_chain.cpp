@@ -21,9 +21,14 @@ void Wrap(BoundSql& text, std::string_view before, std::string_view after) {
     text.text += after;
 }
 
-// SQL Server adds unless both are texts.
+// SQL Server adds unless both are texts. Dates read as SQLite has them, without a time of midnight.
 void MakeText(const Context& context, Operand& operand) {
-    if (context.dialect == Dialect::kSqlServer && operand.type != ValueType::kText) {
+    if (context.dialect == Dialect::kSqlite || operand.type == ValueType::kText) {
+        return;
+    }
+    if (operand.type == ValueType::kDate) {
+        Wrap(operand.text, "replace(convert(nvarchar(19), ", ", 120), N' 00:00:00', N'')");
+    } else {
         Wrap(operand.text, "cast(", " as nvarchar(4000))");
     }
 }
@@ -40,32 +45,44 @@ void Concatenate(const Context& context, Operand& left, Operand&& right) {
     left.operation = '|';
 }
 
-// SQLite would drop the remainder of amounts that are whole.
-void Divide(Operand& left, Operand&& right) {
-    Wrap(left.text, "erp_div(", ", ");
-    Append(left.text, std::move(right.text));
-    left.text.text += ')';
+bool AreWhole(const Operand& left, const Operand& right) {
+    return left.type == ValueType::kInteger && right.type == ValueType::kInteger;
+}
+
+// Both databases would drop the remainder of amounts that are whole.
+void DivideExactly(const Context& context, Operand& left, Operand&& right) {
+    if (context.dialect == Dialect::kSqlite) {
+        Wrap(left.text, "erp_div(", ", ");
+        Append(left.text, std::move(right.text));
+        left.text.text += ')';
+    } else {
+        left.text.text += " * 1.0 / nullif(";
+        Append(left.text, std::move(right.text));
+        left.text.text += ", 0)";
+    }
     left.type = ValueType::kNumber;
     left.operation = '/';
 }
 
-void Compute(char operation, Operand& left, Operand&& right) {
+void Compute(const Context& context, char operation, Operand& left, Operand&& right) {
+    // Divided by 0, SQLite gives null, where SQL Server ends the statement.
+    if (context.dialect == Dialect::kSqlServer && (operation == '/' || operation == '%')) {
+        Wrap(right.text, "nullif(", ", 0)");
+    }
     left.text.text.append(" ").append(1, operation).append(" ");
     Append(left.text, std::move(right.text));
-    const bool whole = left.type == ValueType::kInteger && right.type == ValueType::kInteger;
-    left.type = whole ? ValueType::kInteger : ValueType::kNumber;
+    left.type = AreWhole(left, right) ? ValueType::kInteger : ValueType::kNumber;
     left.operation = operation;
 }
 
 void Join(const Context& context, char operation, Operand& left, Operand&& right) {
     const bool text = left.type == ValueType::kText || right.type == ValueType::kText;
-    const bool whole = left.type == ValueType::kInteger && right.type == ValueType::kInteger;
     if (operation == '|' || (operation == '+' && text)) {
         Concatenate(context, left, std::move(right));
-    } else if (operation == '/' && !whole && context.dialect == Dialect::kSqlite) {
-        Divide(left, std::move(right));
+    } else if (operation == '/' && !AreWhole(left, right)) {
+        DivideExactly(context, left, std::move(right));
     } else {
-        Compute(operation, left, std::move(right));
+        Compute(context, operation, left, std::move(right));
     }
 }
 

@@ -6,6 +6,8 @@
 namespace zebtell::erp::sql {
 namespace {
 
+constexpr std::size_t kMostMarks = 500;  // of one list
+
 // A date written as a text, compared with one that the database holds.
 void TurnIntoDate(const Expr& written, ValueType compared_with, BoundSql& printed) {
     const auto* literal = std::get_if<Literal>(&written.node);
@@ -53,10 +55,7 @@ struct PredicatePrinter {
             Append(out, std::move(pattern));
             out.text += ')';
         } else {
-            Append(out, std::move(operand));
-            out.text += like.negated ? " not like " : " like ";
-            Append(out, std::move(pattern));
-            out.text += " escape '\\'";
+            PrintServerLike(like.negated, std::move(operand), std::move(pattern));
         }
         return true;
     }
@@ -99,6 +98,18 @@ struct PredicatePrinter {
         return false;
     }
 
+    // The blanks that fill up a column of a fixed width are no part of its text, and would stand
+    // in the way unless the pattern takes any end.
+    void PrintServerLike(bool negated, BoundSql&& operand, BoundSql&& pattern) const {
+        const bool any_end = pattern.text == "?" && pattern.values[0].ToPlainText().ends_with('%');
+        out.text += any_end ? "" : "rtrim(";
+        Append(out, std::move(operand));
+        out.text += any_end ? "" : ")";
+        out.text += negated ? " not like " : " like ";
+        Append(out, std::move(pattern));
+        out.text += " escape '\\'";
+    }
+
     void PrintValues(const std::vector<ExprPtr>& values, ValueType type) const {
         const auto* parameter = std::get_if<Parameter>(&values.front()->node);
         if (parameter && values.size() == 1) {
@@ -106,6 +117,9 @@ struct PredicatePrinter {
             AppendInJson(out, list.value.text(), context.dialect, false);
             return;
         }
+        // SQL Server takes 2,100 values a statement.
+        const Temporarily<bool> literals(context.inline_literals,
+                                         context.inline_literals || values.size() > kMostMarks);
         std::string_view glue = " in (";
         for (const ExprPtr& value : values) {
             out.text += glue;

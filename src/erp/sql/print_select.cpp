@@ -1,3 +1,5 @@
+#include <algorithm>
+
 #include "erp/sql/errors.h"
 #include "erp/sql/print.h"
 
@@ -55,7 +57,7 @@ class SelectPrinter {
                                         : &context_.names.Open(table.table);
             PrintTable(context_, *source, from_);
         }
-        if (table.no_lock && context_.dialect == Dialect::kSqlServer) {
+        if (table.no_lock && !table.subquery && context_.dialect == Dialect::kSqlServer) {
             from_.text += " with (nolock)";
         }
         const std::string_view name = table.alias.empty() ? table.table : table.alias;
@@ -148,19 +150,26 @@ class SelectPrinter {
 
     // The order of a subquery means nothing unless it says which rows are the first.
     void PrintOrder() {
-        std::string_view glue = " order by ";
-        for (const OrderItem& item : select_.order) {
-            order_.text += glue;
-            PrintOrderValue(*item.expression);
-            order_.text += item.descending ? " desc" : "";
-            glue = ", ";
-        }
         if (use_ != SelectUse::kResult && !select_.top) {
-            order_ = {};
+            return;
+        }
+        std::vector<std::string> ordered;
+        for (const OrderItem& item : select_.order) {
+            BoundSql value;
+            PrintOrderValue(*item.expression, value);
+            // SQL Server refuses a column that stands there again.
+            if (std::find(ordered.begin(), ordered.end(), value.text) != ordered.end() &&
+                value.values.empty()) {
+                continue;
+            }
+            order_.text += ordered.empty() ? " order by " : ", ";
+            ordered.push_back(value.text);
+            Append(order_, std::move(value));
+            order_.text += item.descending ? " desc" : "";
         }
     }
 
-    void PrintOrderValue(const Expr& value) {
+    void PrintOrderValue(const Expr& value, BoundSql& out) {
         const auto* literal = std::get_if<Literal>(&value.node);
         if (literal) {
             const auto* position = literal->value.As<std::int64_t>();
@@ -168,14 +177,14 @@ class SelectPrinter {
                 *position > static_cast<std::int64_t>(columns_.size())) {
                 Fail("Not a column to order by");
             }
-            order_.text += std::to_string(*position);
-        } else if (!PrintOutputName(value)) {
-            PrintValue(context_, value, scope_, order_);
+            out.text += std::to_string(*position);
+        } else if (!PrintOutputName(value, out)) {
+            PrintValue(context_, value, scope_, out);
         }
     }
 
     // A name that the select gives to one of its columns goes before those of the tables.
-    bool PrintOutputName(const Expr& value) {
+    bool PrintOutputName(const Expr& value, BoundSql& out) {
         const auto* path = std::get_if<Path>(&value.node);
         if (!path || path->parts.size() != 1) {
             return false;
@@ -183,9 +192,9 @@ class SelectPrinter {
         for (std::size_t i = 0; i < select_.items.size(); ++i) {
             if (base::EqualNoCase(select_.items[i].alias, path->parts.front())) {
                 if (use_ == SelectUse::kValues) {
-                    PrintValue(context_, *select_.items[i].expression, scope_, order_);
+                    PrintValue(context_, *select_.items[i].expression, scope_, out);
                 } else {
-                    AppendName(order_, select_.items[i].alias, context_.dialect);
+                    AppendName(out, select_.items[i].alias, context_.dialect);
                 }
                 return true;
             }

@@ -1,4 +1,5 @@
 #include <charconv>
+#include <cmath>
 
 #include "erp/sql/errors.h"
 #include "erp/sql/like_pattern.h"
@@ -23,12 +24,20 @@ ValueType TypeOf(const base::Value& value) {
     }
 }
 
-void AppendNumber(BoundSql& out, const base::Value& number) {
+// Whether the number has few enough digits to be written without an exponent.
+bool IsShort(double number) {
+    return number == 0 || (std::abs(number) >= 1e-9 && std::abs(number) < 1e15);
+}
+
+void AppendNumber(BoundSql& out, const base::Value& value) {
     char digits[40];
     char* const end = digits + sizeof digits;
-    const auto* integer = number.As<std::int64_t>();
+    const auto* integer = value.As<std::int64_t>();
+    const auto* number = value.As<double>();
     const auto written = integer ? std::to_chars(digits, end, *integer)
-                                 : std::to_chars(digits, end, *number.As<double>());
+                         : IsShort(*number)
+                             ? std::to_chars(digits, end, *number, std::chars_format::fixed)
+                             : std::to_chars(digits, end, *number);
     out.text.append(digits, written.ptr);
 }
 
@@ -44,7 +53,7 @@ struct ValuePrinter {
             out.text += "null";
         } else if (type == ValueType::kText) {
             PrintText(value.text());
-        } else if (context.inline_literals && type != ValueType::kDate) {
+        } else if (IsWritten(value, type)) {
             AppendNumber(out, value);
         } else {
             AppendValue(out, value);
@@ -114,6 +123,14 @@ struct ValuePrinter {
     template <class Condition>
     ValueType operator()(const Condition&) const {
         Fail("A condition stands where a value is needed");
+    }
+
+    // SQL Server takes a written number with a mark as a decimal, where a value would be a binary
+    // number and make all that it meets inexact.
+    bool IsWritten(const base::Value& value, ValueType type) const {
+        const auto* number = value.As<double>();
+        const bool exact = number && context.dialect == Dialect::kSqlServer && IsShort(*number);
+        return exact || (context.inline_literals && type != ValueType::kDate);
     }
 
     void PrintText(std::string_view text) const {
