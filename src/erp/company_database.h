@@ -19,6 +19,7 @@ class CompanyDatabase {
     // Reads the schema; RuntimeError kUnspecified when the database is not there.
     explicit CompanyDatabase(std::unique_ptr<Backend> backend);
 
+    Dialect dialect() const { return backend_->dialect(); }
     const Schema& schema() const { return *schema_; }
     const Translator& translator() const { return *translator_; }
     ConnectionPool& pool() { return pool_; }

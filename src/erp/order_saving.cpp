@@ -3,6 +3,7 @@
 #include <algorithm>
 
 #include "base/runtime_error.h"
+#include "erp/made_for.h"
 #include "erp/order_image.h"
 #include "erp/order_review.h"
 #include "erp/order_sums.h"
@@ -57,6 +58,9 @@ class Saving {
     }
 
   private:
+    BoundSql Kept(const std::string& table,
+                  const char* rest,
+                  const std::vector<base::Value>& values) const;
     bool IsStoredAlready();
     void StoreNew();
     void StoreAgain();
@@ -74,11 +78,20 @@ class Saving {
     Stored stored_;
 };
 
+// A select that keeps what it reads of its first table until the transaction ends.
+BoundSql Saving::Kept(const std::string& table,
+                      const char* rest,
+                      const std::vector<base::Value>& values) const {
+    return MadeFor(session_.database().dialect(), [&](Dialect dialect) {
+        return BoundSql{table + std::string(KeptUntilCommit(dialect)) + rest, values};
+    });
+}
+
 bool Saving::IsStoredAlready() {
     const auto row =
-        connection_.Query({"SELECT d.ID, o.Number FROM GDocument d "
-                           "INNER JOIN SDOrder o ON o.ID = d.ID WHERE d.DocKey = ?",
-                           {order_.key}});
+        connection_.Query(Kept("SELECT d.ID, o.Number FROM GDocument d",
+                               " INNER JOIN SDOrder o ON o.ID = d.ID WHERE d.DocKey = ?",
+                               {order_.key}));
     if (!row->Next()) {
         return false;
     }
@@ -95,7 +108,7 @@ void Saving::StoreNew() {
         "GDocument",
         {{"Kind", kOrderTable}, {"DocKey", order_.key}, {"Created", session_.clock()()}}));
     {
-        const auto last = connection_.Query({"SELECT max(Number) FROM SDOrder", {}});
+        const auto last = connection_.Query(Kept("SELECT max(Number) FROM SDOrder", "", {}));
         stored_.number = (last->Next() ? last->GetInteger(0) : 0) + 1;
     }
     ColumnValues values = ValuesOf(order_.header, kHeaderColumns);
@@ -112,6 +125,7 @@ void Saving::StoreNew() {
 }
 
 void Saving::StoreAgain() {
+    connection_.Execute(Kept("SELECT ID FROM SDOrder", " WHERE ID = ?", {order_.id}));
     const auto now = Image(order_.id);
     if (!now) {
         Refuse("The order is not there any more");

@@ -4,6 +4,7 @@
 #include <utility>
 
 #include "base/text.h"
+#include "erp/made_for.h"
 #include "erp/sql/errors.h"
 #include "erp/sql/narrow.h"
 #include "erp/sql/parser.h"
@@ -129,31 +130,14 @@ class TableSelect {
     std::string_view glue_ = " where ";
 };
 
-ServerSqlWatcher& Watcher() {
-    static ServerSqlWatcher watcher;
-    return watcher;
-}
-
 }  // namespace
-
-void WatchServerSql(ServerSqlWatcher watcher) {
-    Watcher() = std::move(watcher);
-}
-
-template <class Make>
-BoundSql Translator::Made(const Make& make) const {
-    if (Watcher() && dialect_ != Dialect::kSqlServer) {
-        Watcher()(make(Dialect::kSqlServer));
-    }
-    return make(dialect_);
-}
 
 BoundSql Translator::ListKeys(const Reader& reader,
                               std::string_view table,
                               std::string_view filter,
                               std::string_view order,
                               std::span<const std::string> columns) const {
-    return Made([&](Dialect dialect) {
+    return MadeFor(dialect_, [&](Dialect dialect) {
         TableSelect select(schema_, dialect, reader, table);
         select.AddFields(columns);
         select.AddCondition(ConditionOf(filter));
@@ -166,7 +150,7 @@ BoundSql Translator::RowsByID(const Reader& reader,
                               std::string_view table,
                               std::span<const std::int64_t> ids,
                               std::span<const std::string> fields) const {
-    return Made([&](Dialect dialect) {
+    return MadeFor(dialect_, [&](Dialect dialect) {
         TableSelect select(schema_, dialect, reader, table);
         select.AddFields(fields);
         select.AddIDs(ids);
@@ -177,7 +161,7 @@ BoundSql Translator::RowsByID(const Reader& reader,
 BoundSql Translator::Select(const Reader& reader, std::string_view sql) const {
     const sql::SelectPtr select = sql::Parser(sql, Style::kStatement).ParseStatement();
     sql::NarrowSubqueries(*select);
-    return Made([&](Dialect dialect) {
+    return MadeFor(dialect_, [&](Dialect dialect) {
         Context context(schema_, dialect, reader, Style::kStatement);
         BoundSql out;
         sql::PrintSelect(context, *select, nullptr, sql::SelectUse::kResult, out);

@@ -1,7 +1,6 @@
 #pragma once
 
 #include <cstdint>
-#include <functional>
 #include <span>
 #include <string>
 #include <string_view>
@@ -45,16 +44,8 @@ class Translator {
     std::vector<std::string> ReadableColumns(const Reader& reader, std::string_view table) const;
 
   private:
-    template <class Make>
-    BoundSql Made(const Make& make) const;
-
     const Schema& schema_;
     Dialect dialect_;
 };
-
-// For tests, which have no SQL Server: whatever a translator makes for another database is made for
-// SQL Server too and handed to the watcher. Set while no other thread translates.
-using ServerSqlWatcher = std::function<void(const BoundSql&)>;
-void WatchServerSql(ServerSqlWatcher watcher);
 
 }  // namespace zebtell::erp

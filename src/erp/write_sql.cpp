@@ -34,4 +34,9 @@ BoundSql UpdateSql(std::string_view table, std::int64_t id, const ColumnValues& 
     return sql;
 }
 
+std::string_view KeptUntilCommit(Dialect dialect) {
+    // SQLite lets nobody else write behind the beginning of a write transaction.
+    return dialect == Dialect::kSqlite ? "" : " WITH (UPDLOCK, HOLDLOCK)";
+}
+
 }  // namespace zebtell::erp

@@ -17,4 +17,8 @@ using ColumnValues = std::vector<std::pair<std::string, base::Value>>;
 BoundSql InsertSql(std::string_view table, const ColumnValues& values);
 BoundSql UpdateSql(std::string_view table, std::int64_t id, const ColumnValues& values);
 
+// Stands behind a table's name in a select of a transaction: the rows that it finds, and that there
+// are no others, stay so until the transaction ends; whoever else reads them so waits.
+std::string_view KeptUntilCommit(Dialect dialect);
+
 }  // namespace zebtell::erp
