@@ -13,6 +13,10 @@ if(ZEBTELL_SANITIZE)
     add_link_options(-fsanitize=${ZEBTELL_SANITIZE})
 endif()
 
+if(ZEBTELL_FUZZ)
+    add_compile_options(-fsanitize=fuzzer-no-link)
+endif()
+
 if(ZEBTELL_SANITIZE STREQUAL thread)
     # ThreadSanitizer does not follow memory fences: Asio has one that can be left out, and one in
     # its reference counts, where the counter's own order is enough for the sanitizer.
@@ -61,4 +65,19 @@ function(zebtell_test name)
     target_link_libraries(${name}_tests PRIVATE ${ARG_LINK} zebtell_test_main)
     target_precompile_headers(${name}_tests REUSE_FROM zebtell_test_main)
     add_test(NAME ${name} COMMAND ${name}_tests)
+endfunction()
+
+# zebtell_fuzz(name LINK layer... USES file...) makes the fuzz target tests/fuzz/<name>.cpp. USES
+# names files of other tests that it is built with.
+function(zebtell_fuzz name)
+    cmake_parse_arguments(ARG "" "" "LINK;USES" ${ARGN})
+    list(TRANSFORM ARG_LINK PREPEND zebtell_)
+    list(TRANSFORM ARG_USES PREPEND ${PROJECT_SOURCE_DIR}/tests/)
+    add_executable(fuzz_${name} ${name}.cpp harness.cpp ${ARG_USES})
+    target_include_directories(fuzz_${name} PRIVATE ${PROJECT_SOURCE_DIR})
+    target_compile_definitions(fuzz_${name}
+                               PRIVATE ZEBTELL_SOURCE_FOLDER="${PROJECT_SOURCE_DIR}")
+    target_link_libraries(fuzz_${name} PRIVATE ${ARG_LINK})
+    target_link_options(fuzz_${name} PRIVATE -fsanitize=fuzzer)
+    add_dependencies(fuzz fuzz_${name})
 endfunction()

@@ -66,10 +66,11 @@ std::string FileText(const std::string& path) {
     return text.str();
 }
 
-void MakeDatabase(const std::string& path) {
+void MakeDatabase(const std::string& path, std::string_view changes) {
     const std::string folder = (SourceFolder() / "database/sqlite/").string();
     const std::string script = "BEGIN;" + FileText(folder + "schema.sql") +
-                               FileText(folder + "views.sql") + kRows + "COMMIT;";
+                               FileText(folder + "views.sql") + kRows + std::string(changes) +
+                               "COMMIT;";
     sqlite3* database = nullptr;
     sqlite3_open(path.c_str(), &database);
     char* message = nullptr;
@@ -84,13 +85,13 @@ void MakeDatabase(const std::string& path) {
 
 }  // namespace
 
-TwoCompanies::TwoCompanies() {
+TwoCompanies::TwoCompanies(std::string_view changes) {
     static int made = 0;
     path_ = std::filesystem::temp_directory_path() /
             ("zebtell-sql-" + std::to_string(getpid()) + "-" + std::to_string(++made) + ".db");
     std::filesystem::remove(path_);
-    MakeDatabase(path_);
-    sqlite::SqliteBackend backend(path_);
+    MakeDatabase(path_, changes);
+    sqlite::SqliteBackend backend(path_, {.reading = std::chrono::milliseconds(500)});
     connection_ = backend.Connect(Access::kRead);
     std::vector<TableInfo> tables = backend.Describe(*connection_).tables;
     FindViewLinks(tables);

@@ -18,7 +18,8 @@ namespace zebtell::erp {
 // hold the word "foreign".
 class TwoCompanies {
   public:
-    TwoCompanies();
+    // With `changes` made to the rows.
+    explicit TwoCompanies(std::string_view changes = {});
     ~TwoCompanies();
     TwoCompanies(const TwoCompanies&) = delete;
     TwoCompanies& operator=(const TwoCompanies&) = delete;
