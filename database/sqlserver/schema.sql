@@ -1,8 +1,10 @@
 -- The tables of the company database for SQL Server 2016 and later, to be run first. Each statement
 -- ends with a semicolon at the end of its line and is a batch of its own.
 --
--- Columns and links are those of the SQLite schema. Texts compare by the database's collation, which
--- must ignore case. Documents (SDOrder, SDConsignmD, SDInvoice) take the key of their GDocument.
+-- Amounts are decimal, which the portal reads exactly; quantities and percentages are numeric, which
+-- it reads as numbers. Columns and links are those of the SQLite schema. Texts compare by the
+-- database's collation, which must ignore case. Documents (SDOrder, SDConsignmD, SDInvoice) take the
+-- key of their GDocument.
 
 -- Companies, people and users
 
@@ -42,7 +44,7 @@ CREATE TABLE GRCompany (
     Phone nvarchar(30) NULL,
     Email nvarchar(100) NULL,
     -- Per cent on every price; negative is a discount.
-    PriceCut decimal(9, 4) NOT NULL DEFAULT 0,
+    PriceCut numeric(9, 4) NOT NULL DEFAULT 0,
     OrdersAllowed bit NOT NULL DEFAULT 1,
     -- Days from an invoice's date to its due date.
     PaymentDays int NOT NULL DEFAULT 14 CHECK (PaymentDays >= 0),
@@ -80,7 +82,7 @@ CREATE TABLE SYUser (
 CREATE TABLE GRTax (
     ID int IDENTITY(1, 1) NOT NULL PRIMARY KEY,
     Name nvarchar(50) NOT NULL,
-    TaxPercent decimal(9, 4) NOT NULL CHECK (TaxPercent >= 0)
+    TaxPercent numeric(9, 4) NOT NULL CHECK (TaxPercent >= 0)
 );
 
 CREATE TABLE GRArticlePriceCat (
@@ -93,10 +95,10 @@ CREATE TABLE GRArticle (
     Code nvarchar(40) NOT NULL UNIQUE,
     Name nvarchar(150) NOT NULL,
     Unit nvarchar(10) NOT NULL DEFAULT N'tk',
-    PackQuantity decimal(18, 4) NOT NULL DEFAULT 1 CHECK (PackQuantity > 0),
+    PackQuantity numeric(18, 4) NOT NULL DEFAULT 1 CHECK (PackQuantity > 0),
     Barcode nvarchar(20) NULL,
     Explanation nvarchar(1000) NULL,
-    Stock decimal(18, 4) NOT NULL DEFAULT 0,
+    Stock numeric(18, 4) NOT NULL DEFAULT 0,
     IDGRTax int NOT NULL,
     IDGRArticlePriceCat int NULL
 );
@@ -129,7 +131,7 @@ CREATE TABLE GRPriceCatRel (
     IDGRArticlePriceCat int NOT NULL,
     -- The list where the price lines stand.
     IDGRPriceList int NOT NULL,
-    PriceCut decimal(9, 4) NOT NULL CHECK (PriceCut >= -100)
+    PriceCut numeric(9, 4) NOT NULL CHECK (PriceCut >= -100)
 );
 
 -- Documents. An order, a delivery note and an invoice share the key of their GDocument.
@@ -154,7 +156,7 @@ CREATE TABLE GDocRel (
 CREATE TABLE GDTax (
     ID int IDENTITY(1, 1) NOT NULL PRIMARY KEY,
     IDGDocument int NOT NULL,
-    TaxPercent decimal(9, 4) NOT NULL,
+    TaxPercent numeric(9, 4) NOT NULL,
     Base decimal(19, 4) NOT NULL,
     Amount decimal(19, 4) NOT NULL
 );
@@ -185,16 +187,16 @@ CREATE TABLE SDOrderRow (
     IDSDOrder int NOT NULL,
     RowNo int NOT NULL,
     IDGRArticle int NOT NULL,
-    Quantity decimal(18, 4) NOT NULL DEFAULT 0 CHECK (Quantity >= 0),
+    Quantity numeric(18, 4) NOT NULL DEFAULT 0 CHECK (Quantity >= 0),
     -- What the customer pays for one, without tax: Amount counts with Price, and UnitPrice is what
     -- the documents show.
     Price decimal(19, 4) NOT NULL DEFAULT 0 CHECK (Price >= 0),
     UnitPrice decimal(19, 4) NOT NULL DEFAULT 0 CHECK (UnitPrice >= 0),
-    PriceCut decimal(9, 4) NOT NULL DEFAULT 0,
+    PriceCut numeric(9, 4) NOT NULL DEFAULT 0,
     Amount decimal(19, 4) NOT NULL DEFAULT 0 CHECK (Amount >= 0),
-    TaxPercent decimal(9, 4) NOT NULL DEFAULT 0,
+    TaxPercent numeric(9, 4) NOT NULL DEFAULT 0,
     Explanation nvarchar(500) NULL,
-    DeliveredQuantity decimal(18, 4) NOT NULL DEFAULT 0 CHECK (DeliveredQuantity >= 0),
+    DeliveredQuantity numeric(18, 4) NOT NULL DEFAULT 0 CHECK (DeliveredQuantity >= 0),
     -- What one would have cost by the customer's price list, where he ordered for less; 0: he has no
     -- price for the article. NULL: nothing to look at.
     ReviewPrice decimal(19, 4) NULL CHECK (ReviewPrice >= 0),
@@ -225,12 +227,12 @@ CREATE TABLE DDStoreDRow (
     -- The order row that this delivers.
     IDSDOrderRow int NULL,
     IDGRArticle int NOT NULL,
-    Quantity decimal(18, 4) NOT NULL DEFAULT 0,
+    Quantity numeric(18, 4) NOT NULL DEFAULT 0,
     Price decimal(19, 4) NOT NULL DEFAULT 0,
     UnitPrice decimal(19, 4) NOT NULL DEFAULT 0,
-    PriceCut decimal(9, 4) NOT NULL DEFAULT 0,
+    PriceCut numeric(9, 4) NOT NULL DEFAULT 0,
     Amount decimal(19, 4) NOT NULL DEFAULT 0,
-    TaxPercent decimal(9, 4) NOT NULL DEFAULT 0,
+    TaxPercent numeric(9, 4) NOT NULL DEFAULT 0,
     Explanation nvarchar(500) NULL,
     Status int NOT NULL DEFAULT 0
 );
@@ -261,12 +263,12 @@ CREATE TABLE SDInvoiceRow (
     -- The delivery note's row that this bills.
     IDDDStoreDRow int NULL,
     IDGRArticle int NOT NULL,
-    Quantity decimal(18, 4) NOT NULL DEFAULT 0,
+    Quantity numeric(18, 4) NOT NULL DEFAULT 0,
     Price decimal(19, 4) NOT NULL DEFAULT 0,
     UnitPrice decimal(19, 4) NOT NULL DEFAULT 0,
-    PriceCut decimal(9, 4) NOT NULL DEFAULT 0,
+    PriceCut numeric(9, 4) NOT NULL DEFAULT 0,
     Amount decimal(19, 4) NOT NULL DEFAULT 0,
-    TaxPercent decimal(9, 4) NOT NULL DEFAULT 0,
+    TaxPercent numeric(9, 4) NOT NULL DEFAULT 0,
     Explanation nvarchar(500) NULL,
     Status int NOT NULL DEFAULT 0
 );

@@ -8,6 +8,7 @@
 #include "erp/password.h"
 #include "erp/sqlite/backend.h"
 #include "tests/erp/sqlite_file.h"
+#include "tests/support/server_sql_recorder.h"
 
 namespace zebtell::erp {
 namespace {
@@ -19,14 +20,17 @@ class WatchedConnection : public Connection {
 
     std::unique_ptr<Cursor> Query(const BoundSql& sql) override {
         watch_->Statement();
+        RecordRun(sql);
         return inner_->Query(sql);
     }
     void Execute(const BoundSql& sql) override {
         watch_->Statement();
+        RecordRun(sql);
         inner_->Execute(sql);
     }
     std::int64_t Insert(const BoundSql& sql) override {
         watch_->Statement();
+        RecordRun(sql);
         return inner_->Insert(sql);
     }
     void Begin() override {
