@@ -18,13 +18,14 @@ int Serve(const std::filesystem::path& folder,
 
 // Makes the demo company and its settings file in `folder`, unless it is there, and says who can
 // log on.
-int MakeDemo(const std::filesystem::path& folder,
-             const std::filesystem::path& templates,
-             const demo::DemoOptions& options);
+int MakeDemo(const std::filesystem::path& folder, const demo::DemoOptions& options);
 
 // Says what is wrong with the settings, the database and the templates; 1 when anything is.
-// `templates` is empty for the folder that the settings name.
-int Check(const std::filesystem::path& folder, const std::filesystem::path& templates);
+// `templates` is empty for the folder that the settings name; `default_templates` are those that
+// came with the program.
+int Check(const std::filesystem::path& folder,
+          const std::filesystem::path& templates,
+          const std::filesystem::path& default_templates);
 
 // Users of the database that the settings name. Passwords are asked for.
 int AddUser(const std::filesystem::path& folder, erp::UserAdmin::NewUser user);

@@ -18,6 +18,11 @@ fs::path ProgramFolder() {
     return unknown ? fs::current_path() : program.parent_path();
 }
 
+// Where the build and the installation put the templates that come with the program.
+fs::path DefaultTemplates() {
+    return ProgramFolder().parent_path() / "share/zebtell/templates";
+}
+
 struct ServeFlags {
     std::optional<std::string> address;
     std::optional<int> port;
@@ -29,13 +34,13 @@ struct ServeFlags {
         if (port) settings.Port = *port;
         if (threads) settings.Threads = *threads;
         if (templates) settings.TemplateFolder = *templates;
+        settings.DefaultTemplates = DefaultTemplates();
     }
 };
 
 struct Flags {
     std::string folder = ProgramFolder().string();
     ServeFlags serve;
-    std::string demo_templates = (ProgramFolder() / "templates").string();
     demo::DemoOptions demo;
     std::string check_templates;
     erp::UserAdmin::NewUser user;
@@ -70,25 +75,29 @@ void AddServe(CLI::App& app, Flags& flags, Command& chosen) {
         ->check(CLI::Range(0, 65535));
     serve->add_option("--threads", flags.serve.threads, "worker threads")
         ->check(CLI::Range(0, 256));
-    serve->add_option("--templates", flags.serve.templates, "folder of the templates");
+    serve->add_option("--templates",
+                      flags.serve.templates,
+                      "folder of own templates, in place of the settings' one");
 }
 
 void AddCheck(CLI::App& app, Flags& flags, Command& chosen) {
-    CLI::App* check = AddCommand(app,
-                                 "check",
-                                 "find what is wrong with settings, database and templates",
-                                 flags,
-                                 chosen,
-                                 [&] { return app::Check(flags.folder, flags.check_templates); });
-    check->add_option("--templates", flags.check_templates, "folder of the templates");
+    CLI::App* check = AddCommand(
+        app,
+        "check",
+        "find what is wrong with settings, database and templates",
+        flags,
+        chosen,
+        [&] { return app::Check(flags.folder, flags.check_templates, DefaultTemplates()); });
+    check->add_option("--templates",
+                      flags.check_templates,
+                      "folder of own templates, in place of the settings' one");
 }
 
 void AddDemo(CLI::App& app, Flags& flags, Command& chosen) {
     CLI::App* demo = AddCommand(
         app, "demo", "make the demo company, unless it is there", flags, chosen, [&flags] {
-            return app::MakeDemo(flags.folder, flags.demo_templates, flags.demo);
+            return app::MakeDemo(flags.folder, flags.demo);
         });
-    demo->add_option("--templates", flags.demo_templates, "folder of the templates");
     demo->add_option("--articles", flags.demo.articles, "articles (3000)");
     demo->add_option("--companies", flags.demo.companies, "customers (40)");
     demo->add_option("--order-rows", flags.demo.order_rows, "rows of all orders (15000)");

@@ -16,7 +16,7 @@ constexpr std::string_view kLogons =
     "  blokk  blokk-demo   customer who may look, not order\n"
     "  (no name, no password: guest)\n";
 
-void WriteSettings(const fs::path& file, const fs::path& folder, const fs::path& templates) {
+void WriteSettings(const fs::path& file) {
     std::ofstream out(file, std::ios::binary);
     out << "; Settings of the demo company; the operations manual explains every key.\r\n"
            "; Paths count from this file's folder.\r\n"
@@ -24,8 +24,7 @@ void WriteSettings(const fs::path& file, const fs::path& folder, const fs::path&
            "[WebGuest]\r\nDispName=Külaline\r\nUserID=WebGuest\r\nPassWord=\r\n\r\n"
            "[WEBLog]\r\nLogFile=ZEBTell.log\r\nLevel=Detail\r\n\r\n"
            "[Session]\r\nBlocking=5\r\nTimeout=5\r\n\r\n"
-           "[Server]\r\nAddress=127.0.0.1\r\nPort=8080\r\nTemplateFolder="
-        << fs::relative(templates, folder).string() << "\r\n";
+           "[Server]\r\nAddress=127.0.0.1\r\nPort=8080\r\n";
     if (!out.flush()) {
         throw base::RuntimeError(base::errors::kUnspecified, "ZEBTell.ini can't be written");
     }
@@ -33,7 +32,7 @@ void WriteSettings(const fs::path& file, const fs::path& folder, const fs::path&
 
 }  // namespace
 
-int MakeDemo(const fs::path& folder, const fs::path& templates, const demo::DemoOptions& options) {
+int MakeDemo(const fs::path& folder, const demo::DemoOptions& options) {
     fs::create_directories(folder);
     const fs::path database = folder / "company.db";
     if (!fs::exists(database)) {
@@ -41,7 +40,7 @@ int MakeDemo(const fs::path& folder, const fs::path& templates, const demo::Demo
         demo::MakeDemoCompany(database, options);
     }
     const fs::path settings = folder / "ZEBTell.ini";
-    if (!fs::exists(settings)) WriteSettings(settings, folder, templates);
+    if (!fs::exists(settings)) WriteSettings(settings);
     std::cout << kLogons;
     return 0;
 }

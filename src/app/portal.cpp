@@ -43,8 +43,8 @@ class Portal::Parts {
           const host::ServerSettings& settings,
           const base::Clock& clock)
         : databases(clock),
-          templates(settings.TemplateFolder),
-          static_files({settings.TemplateFolder / "static"},
+          templates(settings.TemplateFolders()),
+          static_files(settings.TemplateFolders("static"),
                        WithSlash(settings.BasePath) + "static/"),
           global_settings(component_folder),
           services{global_settings, [this] { return databases.NewApplication(); }, clock},

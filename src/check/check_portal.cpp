@@ -10,6 +10,7 @@
 #include "check/template_check.h"
 #include "erp/database.h"
 #include "host/ini_file.h"
+#include "host/server_settings.h"
 #include "host/settings.h"
 
 namespace zebtell::check {
@@ -36,27 +37,28 @@ std::unique_ptr<erp::CompanyDatabase> OpenDatabase(const fs::path& folder,
     }
 }
 
-fs::path TemplateFolder(const fs::path& folder) {
+markup::TemplateFolders TemplateFolders(const PortalFolders& folders) {
     host::clsIniFile file;
-    file.FileName = folder / "ZEBTell.ini";
-    return folder / file.Value("Server", "TemplateFolder");
+    file.FileName = folders.component / "ZEBTell.ini";
+    host::ServerSettings settings;
+    settings.TemplateFolder = folders.templates.empty()
+                                  ? folders.component / file.Value("Server", "TemplateFolder")
+                                  : folders.templates;
+    settings.DefaultTemplates = folders.default_templates;
+    return settings.TemplateFolders();
 }
 
 }  // namespace
 
-std::vector<Finding> CheckPortal(const fs::path& component_folder,
-                                 const fs::path& template_folder,
-                                 std::span<const CheckedPage> pages) {
+std::vector<Finding> CheckPortal(const PortalFolders& folders, std::span<const CheckedPage> pages) {
     // Without settings it is the wrong folder, and all else would only say so again.
     std::error_code error;
-    const bool has_settings = fs::exists(component_folder / "ZEBTell.ini", error);
-    std::vector<Finding> findings = SettingsFaults(component_folder);
-    if (!has_settings && template_folder.empty()) return findings;
-    const auto database = OpenDatabase(component_folder, findings);
+    const bool has_settings = fs::exists(folders.component / "ZEBTell.ini", error);
+    std::vector<Finding> findings = SettingsFaults(folders.component);
+    if (!has_settings && folders.templates.empty()) return findings;
+    const auto database = OpenDatabase(folders.component, findings);
     if (database) Append(findings, MissingInDatabase(database->schema()));
-    const fs::path templates =
-        template_folder.empty() ? TemplateFolder(component_folder) : template_folder;
-    Append(findings, TemplateFaults(templates, pages, Tables(database.get())));
+    Append(findings, TemplateFaults(TemplateFolders(folders), pages, Tables(database.get())));
     std::sort(findings.begin(), findings.end());
     return findings;
 }

@@ -9,11 +9,14 @@
 
 namespace zebtell::check {
 
-// Everything that is wrong with a portal, sorted: the settings in `component_folder`, the company
-// database that they name, and the pages' templates. `template_folder` takes the place of the
-// settings' one unless it is empty.
-std::vector<Finding> CheckPortal(const std::filesystem::path& component_folder,
-                                 const std::filesystem::path& template_folder,
-                                 std::span<const CheckedPage> pages);
+struct PortalFolders {
+    std::filesystem::path component;          // of ZEBTell.ini
+    std::filesystem::path templates;          // takes the place of the settings' one unless empty
+    std::filesystem::path default_templates;  // those that came with the program; empty: none
+};
+
+// Everything that is wrong with a portal, sorted: the settings, the company database that they
+// name, and the pages' templates in every language.
+std::vector<Finding> CheckPortal(const PortalFolders& folders, std::span<const CheckedPage> pages);
 
 }  // namespace zebtell::check

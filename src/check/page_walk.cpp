@@ -63,6 +63,9 @@ class PageWalk {
             reading_.Report(node.name, std::string(node.name) + " has no end");
         }
         CheckIsKnown(node);
+        if (node.lower_name == "zeb:text" && node.is_complete) {
+            reading_.Report(node.name, "ZEB:Text is empty, in another, or around an include");
+        }
         const TagText tag{node.name, node.lower_name, node.text};
         const TagContents* known = FindTagContents(reading_.page.name, node.lower_name);
         if (known == nullptr && IsQueryField(node)) {

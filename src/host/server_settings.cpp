@@ -72,13 +72,22 @@ constexpr ServerSettingsRow kRows[] = {
      "addresses or networks whose X-Forwarded-For and -Proto count, separated by commas"},
     {"TemplateFolder",
      [](ServerSettings& s, const std::string& v) { s.TemplateFolder = v; },
-     "folder of the templates (the folder of ZEBTell.ini)"},
+     "folder of own templates (the folder of ZEBTell.ini)"},
     {"PublicStatus",
      [](ServerSettings& s, const std::string& v) { s.PublicStatus = WholeInt(v, 0, 1) == 1; },
      "1: /healthz and /metrics answer other machines too (0)"},
 };
 
 }  // namespace
+
+std::vector<std::filesystem::path> ServerSettings::TemplateFolders(
+    std::string_view sub_folder) const {
+    std::vector<std::filesystem::path> folders;
+    for (const auto& folder : {TemplateFolder, DefaultTemplates}) {
+        if (!folder.empty()) folders.push_back(folder / sub_folder);
+    }
+    return folders;
+}
 
 std::span<const ServerSettingsRow> ServerSettingsTable() {
     return kRows;

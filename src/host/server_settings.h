@@ -23,7 +23,13 @@ struct ServerSettings {
     std::string TlsKey;
     std::vector<std::string> TrustedProxies;  // addresses or networks, "10.0.0.0/8"
     std::filesystem::path TemplateFolder;     // empty: the component's folder
-    bool PublicStatus = false;                // /healthz and /metrics also for other machines
+    // Not a setting: the templates that came with the program, for those that the folder above does
+    // not have. Empty: there are none.
+    std::filesystem::path DefaultTemplates;
+    bool PublicStatus = false;  // /healthz and /metrics also for other machines
+
+    // In the order in which a template is looked for, each with `sub_folder` behind it.
+    std::vector<std::filesystem::path> TemplateFolders(std::string_view sub_folder = {}) const;
 };
 
 struct ServerSettingsRow {

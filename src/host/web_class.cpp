@@ -62,13 +62,16 @@ void WebClass_Terminate(SessionState& state) {
 }
 
 web::WebClass<SessionState> WebClassHooks() {
-    return {.BeginRequest = WebClass_BeginRequest,
-            .Start = WebClass_Start,
-            .EndRequest = WebClass_EndRequest,
-            .FatalErrorResponse = WebClass_FatalErrorResponse,
-            .Terminate = WebClass_Terminate,
-            .IsLoggedOn = [](const SessionState& state) { return state.logon.LoggedOn; },
-            .CheckLogon = CheckLogon};
+    return {
+        .BeginRequest = WebClass_BeginRequest,
+        .Start = WebClass_Start,
+        .EndRequest = WebClass_EndRequest,
+        .FatalErrorResponse = WebClass_FatalErrorResponse,
+        .Terminate = WebClass_Terminate,
+        .IsLoggedOn = [](const SessionState& state) { return state.logon.LoggedOn; },
+        .CheckLogon = CheckLogon,
+        .Language =
+            [](const SessionState& state) { return LanguageCode(state.settings()->language()); }};
 }
 
 std::unique_ptr<SessionState> NewSession(Services& services) {

@@ -6,6 +6,7 @@
 #include <mutex>
 #include <shared_mutex>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "markup/template_files.h"
@@ -24,6 +25,15 @@ Ticks Now() {
 Ticks NextLook() {
     return Now() + std::chrono::steady_clock::duration(kBetweenLooks).count();
 }
+
+// A template's name and language.
+using Key = std::pair<std::string_view, std::string_view>;
+using OwnKey = std::pair<std::string, std::string>;
+
+struct KeyLess {
+    using is_transparent = void;
+    bool operator()(const Key& a, const Key& b) const { return a < b; }
+};
 
 struct Entry {
     std::shared_ptr<const Template> page;
@@ -46,51 +56,53 @@ struct Entry {
 
 class TemplateCache::Files {
   public:
-    explicit Files(std::filesystem::path folder) : folder_(std::move(folder)) {}
+    explicit Files(TemplateFolders folders) : folders_(std::move(folders)) {}
 
-    std::shared_ptr<const Template> Get(std::string_view name) {
-        const auto entry = Find(name);
+    std::shared_ptr<const Template> Get(Key key) {
+        const auto entry = Find(key);
         if (entry != nullptr && !(entry->ClaimLook() && entry->HasChanged())) return entry->page;
-        return Load(name);
+        return Load(key);
     }
 
   private:
-    std::shared_ptr<Entry> Find(std::string_view name) const {
+    std::shared_ptr<Entry> Find(Key key) const {
         const std::shared_lock lock(mutex_);
-        const auto found = entries_.find(name);
+        const auto found = entries_.find(key);
         return found == entries_.end() ? nullptr : found->second;
     }
 
-    std::shared_ptr<const Template> Load(std::string_view name) {
+    std::shared_ptr<const Template> Load(Key key) {
+        const auto [name, language] = key;
         auto entry = std::make_shared<Entry>();
         entry->next_look = NextLook();
         try {
-            TemplateText read = ReadTemplate(folder_, name);
+            TemplateText read = ReadTemplate(folders_, name, Catalogue(folders_, language));
             entry->files = std::move(read.files);
             entry->page = Template::Parse(std::string(name), std::move(read.text));
         } catch (...) {
             // What can no longer be read is not shown from memory either.
             const std::unique_lock lock(mutex_);
-            if (const auto old = entries_.find(name); old != entries_.end()) entries_.erase(old);
+            if (const auto old = entries_.find(key); old != entries_.end()) entries_.erase(old);
             throw;
         }
         const std::unique_lock lock(mutex_);
-        entries_.insert_or_assign(std::string(name), entry);
+        entries_.insert_or_assign({std::string(name), std::string(language)}, entry);
         return entry->page;
     }
 
-    const std::filesystem::path folder_;
+    const TemplateFolders folders_;
     mutable std::shared_mutex mutex_;
-    std::map<std::string, std::shared_ptr<Entry>, std::less<>> entries_;
+    std::map<OwnKey, std::shared_ptr<Entry>, KeyLess> entries_;
 };
 
-TemplateCache::TemplateCache(std::filesystem::path folder)
-    : files_(std::make_unique<Files>(std::move(folder))) {}
+TemplateCache::TemplateCache(TemplateFolders folders)
+    : files_(std::make_unique<Files>(std::move(folders))) {}
 
 TemplateCache::~TemplateCache() = default;
 
-std::shared_ptr<const Template> TemplateCache::Get(std::string_view file_name) {
-    return files_->Get(file_name);
+std::shared_ptr<const Template> TemplateCache::Get(std::string_view file_name,
+                                                   std::string_view language) {
+    return files_->Get({file_name, language});
 }
 
 }  // namespace zebtell::markup

@@ -1,14 +1,16 @@
 #pragma once
 
 #include <cstddef>
-#include <filesystem>
 #include <string>
 #include <string_view>
 #include <vector>
 
+#include "markup/catalogue.h"
+#include "markup/template_folders.h"
+
 namespace zebtell::markup {
 
-// A line of a file of the template folder, counted from 1.
+// A line of a template file, counted from 1.
 struct TemplatePlace {
     std::string file;  // as the include names it
     std::size_t line = 0;
@@ -29,15 +31,25 @@ struct TemplateSource {
         std::string_view why;  // "is not there"
     };
 
-    std::string text;  // UTF-8, includes replaced
+    // A text for people.
+    struct Text {
+        TemplatePlace place;
+        std::string message;      // what catalogues know it by
+        std::string translation;  // "": there is none
+    };
+
+    std::string text;  // UTF-8, includes and marked texts replaced
     std::vector<Piece> pieces;
     std::vector<Fault> faults;
+    std::vector<Text> texts;
 
     TemplatePlace PlaceOf(std::size_t offset) const;
 };
 
 // As ReadTemplate does, but faults of includes do not end the reading. RuntimeError 53 when the
 // template itself can't be read.
-TemplateSource ReadTemplateSource(const std::filesystem::path& folder, std::string_view file_name);
+TemplateSource ReadTemplateSource(const TemplateFolders& folders,
+                                  std::string_view file_name,
+                                  const Catalogue& catalogue);
 
 }  // namespace zebtell::markup

@@ -65,6 +65,9 @@ struct WebClass {
     // For pages that are for kLoggedOn: whether the request may go on. When not, the response is
     // written. Null: everybody may.
     bool (*CheckLogon)(State&, Call&) = nullptr;
+    // The language of the session's pages, as templates' catalogues are named. Null: templates as
+    // they are written.
+    std::string_view (*Language)(const State&) = nullptr;
 };
 
 }  // namespace zebtell::web

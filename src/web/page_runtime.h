@@ -44,6 +44,15 @@ std::function<Result(SessionInstance&, Args...)> OnInstance(Result (*function)(S
     };
 }
 
+// The same for what only reads the State.
+template <class State, class Result>
+std::function<Result(const SessionInstance&)> OnConstInstance(Result (*function)(const State&)) {
+    if (function == nullptr) return nullptr;
+    return [function](const SessionInstance& instance) {
+        return function(StateInstance<State>::Of(instance));
+    };
+}
+
 template <class State>
 Site MakeSite(const std::vector<Page<State>>& table,
               const WebClass<State>& web_class,
@@ -71,14 +80,9 @@ Site MakeSite(const std::vector<Page<State>>& table,
                     .start = OnInstance(web_class.Start),
                     .end_request = OnInstance(web_class.EndRequest),
                     .fatal = OnInstance(web_class.FatalErrorResponse),
-                    .is_logged_on = nullptr,
-                    .check_logon = OnInstance(web_class.CheckLogon)};
-    if (web_class.IsLoggedOn != nullptr) {
-        hooks.is_logged_on = [is_logged_on =
-                                  web_class.IsLoggedOn](const SessionInstance& instance) {
-            return is_logged_on(StateInstance<State>::Of(instance));
-        };
-    }
+                    .is_logged_on = OnConstInstance(web_class.IsLoggedOn),
+                    .check_logon = OnInstance(web_class.CheckLogon),
+                    .language = OnConstInstance(web_class.Language)};
     return Site(std::move(pages), std::move(hooks));
 }
 

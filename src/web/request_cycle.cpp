@@ -103,7 +103,8 @@ class Cycle {
     void WriteTemplate() {
         if (page_ == nullptr)
             throw base::RuntimeError(base::errors::kInvalidCall, "No page to write");
-        const auto page = context_.templates.Get(page_->template_file);
+        const auto language = hooks_.language ? hooks_.language(instance_) : std::string_view{};
+        const auto page = context_.templates.Get(page_->template_file, language);
         std::string& body = response_.body();
         body.reserve(body.size() + 2 * page->text().size());
         const auto process_tag = [this](markup::Tag& tag) {

@@ -54,6 +54,7 @@ struct SiteHooks {
     std::function<void(SessionInstance&, Call&, const std::exception&, bool& send_default)> fatal;
     std::function<bool(const SessionInstance&)> is_logged_on;
     std::function<bool(SessionInstance&, Call&)> check_logon;
+    std::function<std::string_view(const SessionInstance&)> language;
 };
 
 class Site {

@@ -31,7 +31,7 @@ class CheckTest : public testing::Test {
     // The findings as they are printed, one a line.
     std::string Faults(const std::filesystem::path& templates = {}) const {
         std::ostringstream out;
-        for (const Finding& finding : CheckPortal(folder.path(), templates, pages)) {
+        for (const Finding& finding : CheckPortal({folder.path(), templates, {}}, pages)) {
             out << finding << "\n";
         }
         return out.str();

@@ -46,7 +46,7 @@ class TemplateCacheTest : public testing::Test {
     }
 
     const fs::path root_ = MakeFolder();
-    TemplateCache cache_{root_ / "pages"};
+    TemplateCache cache_{TemplateFolders{root_ / "pages"}};
 };
 
 TEST_F(TemplateCacheTest, EncodingsAndIncludes) {

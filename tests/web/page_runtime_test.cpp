@@ -220,7 +220,7 @@ TEST(PageRuntime, AFailedInitialisationIsToldAndTriedAgain) {
     RuntimeOptions options;
     options.log = [&](std::string_view text) { logged = text; };
     Journal journal;
-    markup::TemplateCache templates("/nonexistent");
+    markup::TemplateCache templates(markup::TemplateFolders{"/nonexistent"});
     PageRuntime<TestState> runtime(
         TestPages(),
         TestHooks(),
@@ -257,7 +257,7 @@ Page<TestState> PageWithEvents(const char* name, std::initializer_list<const cha
 }
 
 TEST(PageRuntime, RefusesATableWithNamesTwice) {
-    markup::TemplateCache templates(".");
+    markup::TemplateCache templates(markup::TemplateFolders{"."});
     const auto make = [&](std::vector<Page<TestState>> pages) {
         PageRuntime<TestState> runtime(pages, TestHooks(), nullptr, templates, {});
     };

@@ -154,7 +154,7 @@ inline WebClass<TestState> TestHooks() {
 // A runtime of the small site over a template folder of its own, with a clock that tests move.
 class TestSite {
   public:
-    explicit TestSite(RuntimeOptions options = {}) : templates_(folder_) {
+    explicit TestSite(RuntimeOptions options = {}) : templates_({folder_}) {
         Put("esimene.htm", "<p><ZEB:Page/> <ZEB:Visits/> <ZEB:Link/></p>");
         Put("teine.htm", "second template <ZEB:Page>kept</ZEB:Page>");
         Put("halb.htm", "so far <ZEB:Throw/>");
