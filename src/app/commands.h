@@ -27,6 +27,10 @@ int Check(const std::filesystem::path& folder,
           const std::filesystem::path& templates,
           const std::filesystem::path& default_templates);
 
+// Prints the texts that the templates of a folder mark to be translated, as gettext's tools read
+// them, each with the files and lines where it stands.
+int PrintTexts(const std::filesystem::path& templates);
+
 // Users of the database that the settings name. Passwords are asked for.
 int AddUser(const std::filesystem::path& folder, erp::UserAdmin::NewUser user);
 int SetUserPassword(const std::filesystem::path& folder, const std::string& name);

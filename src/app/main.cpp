@@ -43,6 +43,7 @@ struct Flags {
     ServeFlags serve;
     demo::DemoOptions demo;
     std::string check_templates;
+    std::string text_templates;
     erp::UserAdmin::NewUser user;
 };
 
@@ -143,6 +144,12 @@ void AddTags(CLI::App& app, Command& chosen) {
     });
 }
 
+void AddTexts(CLI::App& app, Flags& flags, Command& chosen) {
+    CLI::App* texts = app.add_subcommand("texts", "print the texts of templates to be translated");
+    texts->add_option("templates", flags.text_templates, "their folder")->required();
+    texts->callback([&] { chosen = [&] { return app::PrintTexts(flags.text_templates); }; });
+}
+
 int Run(int argc, char** argv) {
     CLI::App app{"ZEBTell, the web ordering portal"};
     app.require_subcommand(1);
@@ -153,6 +160,7 @@ int Run(int argc, char** argv) {
     AddDemo(app, flags, chosen);
     AddUserCommands(app, flags, chosen);
     AddTags(app, chosen);
+    AddTexts(app, flags, chosen);
     CLI11_PARSE(app, argc, argv);
     return chosen();
 }
