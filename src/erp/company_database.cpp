@@ -13,7 +13,7 @@ constexpr std::size_t kResultBytes = std::size_t{64} * 1024 * 1024;
 CompanyDatabase::CompanyDatabase(std::unique_ptr<Backend> backend)
     : backend_(std::move(backend)), pool_(*backend_), results_(kResultBytes) {
     const Lease connection = pool_.Read();
-    description_ = backend_->Describe(*connection);
+    description_ = connection->Describe();
     FindViewLinks(description_.tables);
     schema_ = std::make_unique<Schema>(std::move(description_.tables));
     translator_ = std::make_unique<Translator>(*schema_, backend_->dialect());

@@ -45,6 +45,13 @@ class Cursor {
     virtual std::int64_t GetInteger(std::size_t column) const = 0;  // null: 0
 };
 
+// What a database says of itself.
+struct DatabaseDescription {
+    std::vector<TableInfo> tables;
+    // The most characters that text columns take, by "table.column"; no entry: no limit.
+    std::unordered_map<std::string, int, base::NoCaseHash, base::NoCaseEqual> lengths;
+};
+
 // What a connection is for. Reading connections can't write and end statements that take too long.
 enum class Access { kRead, kWrite };
 
@@ -68,6 +75,7 @@ class Connection {
     virtual bool IsBroken() const { return false; }
     // Asks the database for a sign of life, which costs a round trip.
     virtual bool Answers() { return true; }
+    virtual DatabaseDescription Describe() = 0;
 };
 
 // Tells when cached results may be out of date. Used by one thread at a time.
@@ -80,13 +88,6 @@ class CommitWatch {
     virtual std::int64_t DataVersion() = 0;
 };
 
-// What a database says of itself.
-struct DatabaseDescription {
-    std::vector<TableInfo> tables;
-    // The most characters that text columns take, by "table.column"; no entry: no limit.
-    std::unordered_map<std::string, int, base::NoCaseHash, base::NoCaseEqual> lengths;
-};
-
 // A company database of one kind: all that differs between the kinds. Thread-safe.
 class Backend {
   public:
@@ -95,7 +96,6 @@ class Backend {
     // RuntimeError kUnspecified when the database is not there.
     virtual std::unique_ptr<Connection> Connect(Access access) = 0;
     virtual std::unique_ptr<CommitWatch> WatchCommits() = 0;
-    virtual DatabaseDescription Describe(Connection& connection) = 0;
     virtual Dialect dialect() const = 0;
 };
 

@@ -4,6 +4,7 @@
 #include "base/runtime_error.h"
 #include "erp/application.h"
 #include "erp/company_database.h"
+#include "erp/odbc/backend.h"
 #include "erp/sqlite/backend.h"
 
 namespace zebtell::erp {
@@ -12,7 +13,7 @@ std::unique_ptr<Backend> MakeBackend(data::DatabaseType type, const std::string&
     if (type == data::DatabaseType::kSqlite) {
         return std::make_unique<sqlite::SqliteBackend>(path);
     }
-    throw base::RuntimeError(base::errors::kUnspecified, "This kind of database is not supported");
+    return std::make_unique<odbc::OdbcBackend>(path);
 }
 
 Databases::Databases(base::Clock clock) : Databases(std::move(clock), MakeBackend) {}

@@ -7,6 +7,7 @@
 #include "base/runtime_error.h"
 #include "erp/password.h"
 #include "erp/sqlite/backend.h"
+#include "tests/erp/odbc_sqlite.h"
 #include "tests/erp/sqlite_file.h"
 #include "tests/support/server_sql_recorder.h"
 
@@ -47,6 +48,7 @@ class WatchedConnection : public Connection {
     void Rollback() noexcept override { inner_->Rollback(); }
     bool IsBroken() const override { return inner_->IsBroken(); }
     bool Answers() override { return inner_->Answers(); }
+    DatabaseDescription Describe() override { return inner_->Describe(); }
 
   private:
     std::unique_ptr<Connection> inner_;
@@ -62,9 +64,6 @@ class WatchedBackend : public Backend {
         return std::make_unique<WatchedConnection>(inner_->Connect(access), watch_);
     }
     std::unique_ptr<CommitWatch> WatchCommits() override { return inner_->WatchCommits(); }
-    DatabaseDescription Describe(Connection& connection) override {
-        return inner_->Describe(connection);
-    }
     Dialect dialect() const override { return inner_->dialect(); }
 
   private:
@@ -84,7 +83,7 @@ class SqliteCompany : public Company {
         return std::make_unique<sqlite::SqliteBackend>(path(), limits);
     }
 
-  private:
+  protected:
     // Made once, copied for each test.
     static std::filesystem::path Original() {
         static const TempFolder folder;
@@ -96,7 +95,18 @@ class SqliteCompany : public Company {
         return path;
     }
 
+  private:
     TempFolder folder_;
+};
+
+class OdbcSqliteCompany : public SqliteCompany {
+  public:
+    OdbcSqliteCompany() : database_(SqliteCompany::path()) {}
+
+    std::unique_ptr<Backend> MakeBackend() const override { return database_.MakeBackend(); }
+
+  private:
+    OdbcSqlite database_;
 };
 
 }  // namespace
@@ -129,7 +139,8 @@ std::string Company::Show(const std::string& sql) const {
 }
 
 std::vector<DatabaseKind> DatabaseKinds() {
-    return {{"Sqlite", [] { return std::make_unique<SqliteCompany>(); }}};
+    return {{"Sqlite", [] { return std::make_unique<SqliteCompany>(); }},
+            {"OdbcSqlite", [] { return std::make_unique<OdbcSqliteCompany>(); }}};
 }
 
 PortalTest::PortalTest() : company_(GetParam().make()) {

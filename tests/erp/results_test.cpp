@@ -109,6 +109,7 @@ struct Counting : Connection {
     void Begin() override {}
     void Commit() override {}
     void Rollback() noexcept override {}
+    DatabaseDescription Describe() override { return {}; }
     std::int64_t& commits;
 };
 
@@ -126,7 +127,6 @@ struct CountingBackend : Backend {
     std::unique_ptr<CommitWatch> WatchCommits() override {
         return std::make_unique<CountingWatch>(commits);
     }
-    DatabaseDescription Describe(Connection&) override { return {}; }
     Dialect dialect() const override { return Dialect::kSqlite; }
     std::int64_t commits = 0;
     int connections = 0;

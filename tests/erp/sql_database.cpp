@@ -93,7 +93,7 @@ TwoCompanies::TwoCompanies(std::string_view changes) {
     MakeDatabase(path_, changes);
     sqlite::SqliteBackend backend(path_, {.reading = std::chrono::milliseconds(500)});
     connection_ = backend.Connect(Access::kRead);
-    std::vector<TableInfo> tables = backend.Describe(*connection_).tables;
+    std::vector<TableInfo> tables = connection_->Describe().tables;
     FindViewLinks(tables);
     schema_ = std::make_unique<Schema>(std::move(tables));
 }

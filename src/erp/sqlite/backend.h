@@ -15,7 +15,6 @@ class SqliteBackend : public Backend {
 
     std::unique_ptr<Connection> Connect(Access access) override;
     std::unique_ptr<CommitWatch> WatchCommits() override;
-    DatabaseDescription Describe(Connection& connection) override;
     Dialect dialect() const override { return Dialect::kSqlite; }
 
   private:

@@ -1,5 +1,6 @@
 #include "erp/sqlite/connection.h"
 
+#include "erp/sqlite/catalogue.h"
 #include "erp/sqlite/column_types.h"
 #include "erp/sqlite/errors.h"
 #include "erp/sqlite/functions.h"
@@ -117,6 +118,10 @@ void SqliteConnection::Rollback() noexcept {
     if (!sqlite3_get_autocommit(database_)) {
         sqlite3_exec(database_, "ROLLBACK", nullptr, nullptr, nullptr);
     }
+}
+
+DatabaseDescription SqliteConnection::Describe() {
+    return ReadCatalogue(*this);
 }
 
 std::int64_t SqliteConnection::DataVersion() {

@@ -31,6 +31,7 @@ class SqliteConnection : public Connection {
     void Begin() override;
     void Commit() override;
     void Rollback() noexcept override;
+    DatabaseDescription Describe() override;
 
     // Another number whenever other connections have committed something.
     std::int64_t DataVersion();
