@@ -3,6 +3,9 @@
 
 #include "app/commands.h"
 #include "base/runtime_error.h"
+#include "erp/connection.h"
+#include "erp/database.h"
+#include "host/settings.h"
 
 namespace zebtell::app {
 namespace {
@@ -30,10 +33,21 @@ void WriteSettings(const fs::path& file) {
     }
 }
 
+// The settings name a database on a server: that is where the company goes.
+bool MakeOnServer(const fs::path& folder, const demo::DemoOptions& options) {
+    const host::Settings settings = host::LoadSettings(folder);
+    if (settings.Type == data::DatabaseType::kSqlite) return false;
+    std::cout << "Making the demo company in the database that ZEBTell.ini names" << std::endl;
+    demo::MakeDemoCompany(*erp::MakeBackend(settings.Type, settings.Path), options);
+    std::cout << kLogons;
+    return true;
+}
+
 }  // namespace
 
 int MakeDemo(const fs::path& folder, const demo::DemoOptions& options) {
     fs::create_directories(folder);
+    if (MakeOnServer(folder, options)) return 0;
     const fs::path database = folder / "company.db";
     if (!fs::exists(database)) {
         std::cout << "Making the demo company in " << folder.string() << std::endl;

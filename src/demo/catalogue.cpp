@@ -32,11 +32,11 @@ double PercentOfTax(TaxRate rate) {
     return kTaxes[static_cast<int>(rate) - 1].percent;
 }
 
-void WriteNames(const DatabaseFile& file) {
-    Insert taxes(file, "GRTax", {"ID", "Name", "TaxPercent"});
-    Insert groups(file, "GRArticlePriceCat", {"ID", "Name"});
-    Insert categories(file, "GRArticleCat", {"ID", "Name", "Category"});
-    Insert lists(file, "GRPriceList", {"ID", "Name", "Currency", "IDSrcPriceList", "IsDefault"});
+void WriteNames(CompanyStore& store) {
+    Insert taxes(store, "GRTax", {"ID", "Name", "TaxPercent"});
+    Insert groups(store, "GRArticlePriceCat", {"ID", "Name"});
+    Insert categories(store, "GRArticleCat", {"ID", "Name", "Category"});
+    Insert lists(store, "GRPriceList", {"ID", "Name", "Currency", "IDSrcPriceList", "IsDefault"});
     int id = 0;
     for (const Tax& tax : kTaxes) {
         taxes.Row(++id, tax.name, tax.percent);
@@ -64,8 +64,8 @@ Currency ListPrice(const ArticleKind& kind, const ArticleName& name, Random& ran
 
 class CatalogueWriter {
   public:
-    explicit CatalogueWriter(const DatabaseFile& file)
-        : articles_(file,
+    explicit CatalogueWriter(CompanyStore& store)
+        : articles_(store,
                     "GRArticle",
                     {"ID",
                      "Code",
@@ -77,8 +77,8 @@ class CatalogueWriter {
                      "Stock",
                      "IDGRTax",
                      "IDGRArticlePriceCat"}),
-          categories_(file, "GRArticleCatRel", {"IDGRArticle", "IDGRArticleCat"}),
-          lines_(file, "GRPriceListRel", {"IDGRPriceList", "IDGRArticle", "Price"}) {}
+          categories_(store, "GRArticleCatRel", {"IDGRArticle", "IDGRArticleCat"}),
+          lines_(store, "GRPriceListRel", {"IDGRPriceList", "IDGRArticle", "Price"}) {}
 
     Article WriteArticle(int id);
     Article WriteTransport(int id);
@@ -175,9 +175,9 @@ void CatalogueWriter::WriteLines(const Catalogue& catalogue) {
 
 }  // namespace
 
-Catalogue WriteCatalogue(const DatabaseFile& file, int articles) {
-    WriteNames(file);
-    CatalogueWriter writer(file);
+Catalogue WriteCatalogue(CompanyStore& store, int articles) {
+    WriteNames(store);
+    CatalogueWriter writer(store);
     Catalogue catalogue;
     catalogue.articles.reserve(static_cast<std::size_t>(articles));
     for (int id = 1; id <= articles; ++id) {

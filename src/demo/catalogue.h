@@ -6,7 +6,7 @@
 
 #include "base/currency.h"
 #include "demo/article_kinds.h"
-#include "demo/database_file.h"
+#include "demo/company_store.h"
 
 namespace zebtell::demo {
 
@@ -41,6 +41,6 @@ struct Catalogue {
 };
 
 // Stores the articles, their categories and taxes and the price lists, and returns them.
-Catalogue WriteCatalogue(const DatabaseFile& file, int articles);
+Catalogue WriteCatalogue(CompanyStore& store, int articles);
 
 }  // namespace zebtell::demo

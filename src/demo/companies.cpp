@@ -78,8 +78,8 @@ std::int64_t ListThatCounts(const CompanyRow& row) {
         row.parent == 0 || row.price_list != 0 ? row.price_list : RowOf(row.parent).price_list;
     return list == 0 ? kBaseList : list;
 }
-void WriteSellers(const DatabaseFile& file, Random& random) {
-    Insert employees(file, "EREmployee", {"ID", "Name", "Phone", "Email"});
+void WriteSellers(CompanyStore& store, Random& random) {
+    Insert employees(store, "EREmployee", {"ID", "Name", "Phone", "Email"});
     int id = 0;
     for (std::string_view name : kSellers) {
         ++id;
@@ -88,9 +88,9 @@ void WriteSellers(const DatabaseFile& file, Random& random) {
     }
 }
 
-void WritePriceCuts(const DatabaseFile& file) {
-    Insert groups(file, "GRCompanyPriceCat", {"ID", "Name"});
-    Insert cuts(file,
+void WritePriceCuts(CompanyStore& store) {
+    Insert groups(store, "GRCompanyPriceCat", {"ID", "Name"});
+    Insert cuts(store,
                 "GRPriceCatRel",
                 {"IDGRCompanyPriceCat", "IDGRArticlePriceCat", "IDGRPriceList", "PriceCut"});
     int id = 0;
@@ -107,8 +107,8 @@ void WritePriceCuts(const DatabaseFile& file) {
 
 class CompanyWriter {
   public:
-    explicit CompanyWriter(const DatabaseFile& file)
-        : companies_(file,
+    explicit CompanyWriter(CompanyStore& store)
+        : companies_(store,
                      "GRCompany",
                      {"ID",
                       "Code",
@@ -129,8 +129,8 @@ class CompanyWriter {
                       "IDParent",
                       "IDGRCompanyPriceCat",
                       "IDEREmployee"}),
-          people_(file, "GRCompContPerson", {"IDGRCompany", "Name", "Position", "Phone", "Email"}) {
-    }
+          people_(
+              store, "GRCompContPerson", {"IDGRCompany", "Name", "Position", "Phone", "Email"}) {}
 
     Buyer Write(std::int64_t id);
 
@@ -204,11 +204,11 @@ std::int64_t CompanyWriter::WritePeople(std::int64_t company, std::string_view c
 
 }  // namespace
 
-std::vector<Buyer> WriteCompanies(const DatabaseFile& file, int companies) {
+std::vector<Buyer> WriteCompanies(CompanyStore& store, int companies) {
     Random random(3);
-    WriteSellers(file, random);
-    WritePriceCuts(file);
-    CompanyWriter writer(file);
+    WriteSellers(store, random);
+    WritePriceCuts(store);
+    CompanyWriter writer(store);
     std::vector<Buyer> buyers;
     buyers.reserve(static_cast<std::size_t>(companies));
     for (std::int64_t id = 1; id <= companies; ++id) {

@@ -4,8 +4,8 @@
 #include <vector>
 
 #include "demo/catalogue.h"
+#include "demo/company_store.h"
 #include "demo/company_table.h"
-#include "demo/database_file.h"
 
 namespace zebtell::demo {
 
@@ -20,9 +20,9 @@ struct Buyer {
 };
 
 // Stores the companies with their people, price categories and percentages.
-std::vector<Buyer> WriteCompanies(const DatabaseFile& file, int companies);
+std::vector<Buyer> WriteCompanies(CompanyStore& store, int companies);
 
 // Stores the users: those that people are told of, and one for each other company.
-void WriteUsers(const DatabaseFile& file, const std::vector<Buyer>& buyers);
+void WriteUsers(CompanyStore& store, const std::vector<Buyer>& buyers);
 
 }  // namespace zebtell::demo

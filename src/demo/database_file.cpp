@@ -27,6 +27,51 @@ std::string InsertText(std::string_view table, const std::vector<std::string_vie
     return "insert into " + std::string(table) + " (" + names + ") values (" + marks + ")";
 }
 
+// A prepared insert statement.
+class TableRows : public RowWriter {
+  public:
+    TableRows(sqlite3* handle, const std::string& insert) {
+        sqlite3_stmt* statement = nullptr;
+        const int result = sqlite3_prepare_v2(handle, insert.c_str(), -1, &statement, nullptr);
+        statement_.reset(statement);
+        Check(result == SQLITE_OK, handle);
+    }
+
+    void Write(std::span<const Cell> row) override {
+        int position = 0;
+        for (const Cell& cell : row) {
+            ++position;
+            std::visit([&](const auto& value) { Bind(position, value); }, cell);
+        }
+        Check(sqlite3_step(statement_.get()) == SQLITE_DONE, sqlite3_db_handle(statement_.get()));
+        sqlite3_reset(statement_.get());
+    }
+
+  private:
+    void Bind(int position, std::monostate) { sqlite3_bind_null(statement_.get(), position); }
+    void Bind(int position, std::int64_t number) {
+        sqlite3_bind_int64(statement_.get(), position, number);
+    }
+    void Bind(int position, double number) {
+        sqlite3_bind_double(statement_.get(), position, number);
+    }
+    void Bind(int position, base::Currency amount) { Bind(position, amount.ToDouble()); }
+    void Bind(int position, base::DateTime date) {
+        BindText(position, date.ToIso(), SQLITE_TRANSIENT);
+    }
+    void Bind(int position, std::string_view text) {  // it outlives the step that reads it
+        BindText(position, text, SQLITE_STATIC);
+    }
+    void BindText(int position, std::string_view text, sqlite3_destructor_type keeping) {
+        sqlite3_bind_text(statement_.get(), position, text.data(), int(text.size()), keeping);
+    }
+
+    struct Finalize {
+        void operator()(sqlite3_stmt* statement) const { sqlite3_finalize(statement); }
+    };
+    std::unique_ptr<sqlite3_stmt, Finalize> statement_;
+};
+
 }  // namespace
 
 DatabaseFile::DatabaseFile(const std::filesystem::path& path) {
@@ -58,58 +103,16 @@ void DatabaseFile::PostponeIndexes() {
     Execute(drops);
 }
 
+RowWriter& DatabaseFile::Table(std::string_view name,
+                               const std::vector<std::string_view>& columns) {
+    tables_.push_back(std::make_unique<TableRows>(handle(), InsertText(name, columns)));
+    return *tables_.back();
+}
+
 void DatabaseFile::Finish() {
+    tables_.clear();
     Execute(postponed_ + "analyze; commit; pragma synchronous = full; pragma journal_mode = wal");
     handle_.reset();
-}
-
-Insert::Insert(const DatabaseFile& file,
-               std::string_view table,
-               const std::vector<std::string_view>& columns) {
-    const std::string text = InsertText(table, columns);
-    sqlite3_stmt* statement = nullptr;
-    const int result = sqlite3_prepare_v2(file.handle(), text.c_str(), -1, &statement, nullptr);
-    statement_.reset(statement);
-    Check(result == SQLITE_OK, file.handle());
-}
-
-void Insert::Bind(int position, std::int64_t number) {
-    sqlite3_bind_int64(statement_.get(), position, number);
-}
-
-void Insert::Bind(int position, double number) {
-    sqlite3_bind_double(statement_.get(), position, number);
-}
-
-void Insert::Bind(int position, base::Currency amount) {
-    Bind(position, amount.ToDouble());
-}
-
-void Insert::Bind(int position, base::DateTime date) {
-    const std::string text = date.ToIso();
-    sqlite3_bind_text(statement_.get(), position, text.data(), int(text.size()), SQLITE_TRANSIENT);
-}
-
-void Insert::Bind(int position, Link link) {
-    if (link.id == 0) {
-        sqlite3_bind_null(statement_.get(), position);
-    } else {
-        Bind(position, link.id);
-    }
-}
-
-void Insert::Bind(int position, std::string_view text) {
-    if (text.empty()) {
-        sqlite3_bind_null(statement_.get(), position);
-    } else {  // the text outlives the step that reads it
-        sqlite3_bind_text(statement_.get(), position, text.data(), int(text.size()), SQLITE_STATIC);
-    }
-}
-
-void Insert::Run() {
-    sqlite3* handle = sqlite3_db_handle(statement_.get());
-    Check(sqlite3_step(statement_.get()) == SQLITE_DONE, handle);
-    sqlite3_reset(statement_.get());
 }
 
 }  // namespace zebtell::demo

@@ -7,6 +7,7 @@
 #include "base/runtime_error.h"
 #include "demo/catalogue.h"
 #include "demo/companies.h"
+#include "demo/connection_store.h"
 #include "demo/database_file.h"
 #include "demo/sql_files.h"
 #include "demo/trade.h"
@@ -81,6 +82,13 @@ class UnfinishedFile {
     fs::path path_;
 };
 
+void WriteCompany(CompanyStore& store, const DemoOptions& options) {
+    const Catalogue catalogue = WriteCatalogue(store, options.articles);
+    const std::vector<Buyer> buyers = WriteCompanies(store, options.companies);
+    WriteUsers(store, buyers);
+    Trade(store, catalogue, buyers, options).Run();
+}
+
 }  // namespace
 
 void MakeDemoCompany(const fs::path& database_file, const DemoOptions& options) {
@@ -91,13 +99,17 @@ void MakeDemoCompany(const fs::path& database_file, const DemoOptions& options) 
         file.Execute(std::string(kSchemaSql));
         file.Execute(std::string(kViewsSql));
         file.PostponeIndexes();
-        const Catalogue catalogue = WriteCatalogue(file, options.articles);
-        const std::vector<Buyer> buyers = WriteCompanies(file, options.companies);
-        WriteUsers(file, buyers);
-        Trade(file, catalogue, buyers, options).Run();
+        WriteCompany(file, options);
         file.Finish();
     }
     unfinished.Publish();
+}
+
+void MakeDemoCompany(erp::Backend& backend, const DemoOptions& options) {
+    CheckRanges(options);
+    ConnectionStore store(backend);
+    WriteCompany(store, options);
+    store.Finish();
 }
 
 }  // namespace zebtell::demo

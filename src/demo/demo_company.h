@@ -3,6 +3,7 @@
 #include <filesystem>
 
 #include "base/date_time.h"
+#include "erp/connection.h"
 
 namespace zebtell::demo {
 
@@ -20,5 +21,9 @@ struct DemoOptions {
 // ".new") and gets its name when it is complete; an existing file is refused, and so is a
 // ".new" file that another run may be writing. RuntimeError for these and for a full disk.
 void MakeDemoCompany(const std::filesystem::path& database_file, const DemoOptions& options);
+
+// Makes the same company in an empty database on a server, all of it or nothing: tables, rows,
+// indexes and views. RuntimeError for a database that is not empty, and for what the database says.
+void MakeDemoCompany(erp::Backend& backend, const DemoOptions& options);
 
 }  // namespace zebtell::demo

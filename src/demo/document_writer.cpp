@@ -36,8 +36,7 @@ Currency PaidOf(const TradeDocument& invoice, const DocumentSums& sums) {
 
 }  // namespace
 
-DocumentWriter::Kind DocumentWriter::MakeKind(const DatabaseFile& file,
-                                              const KindColumns& columns) {
+DocumentWriter::Kind DocumentWriter::MakeKind(CompanyStore& store, const KindColumns& columns) {
     Columns header = {"ID",
                       "Number",
                       "DocDate",
@@ -66,16 +65,16 @@ DocumentWriter::Kind DocumentWriter::MakeKind(const DatabaseFile& file,
                          "Status",
                          columns.row_own};
     return {columns.table,
-            Insert(file, columns.table, header),
-            Insert(file, columns.row_table, row),
+            Insert(store, columns.table, header),
+            Insert(store, columns.row_table, row),
             columns.last_number};
 }
 
-DocumentWriter::DocumentWriter(const DatabaseFile& file)
-    : documents_(file, "GDocument", {"ID", "Kind", "DocKey", "Created"}),
-      relations_(file, "GDocRel", {"IDGDocument", "IDSrcGDocument"}),
-      taxes_(file, "GDTax", {"IDGDocument", "TaxPercent", "Base", "Amount"}),
-      orders_(MakeKind(file,
+DocumentWriter::DocumentWriter(CompanyStore& store)
+    : documents_(store, "GDocument", {"ID", "Kind", "DocKey", "Created"}),
+      relations_(store, "GDocRel", {"IDGDocument", "IDSrcGDocument"}),
+      taxes_(store, "GDTax", {"IDGDocument", "TaxPercent", "Base", "Amount"}),
+      orders_(MakeKind(store,
                        {"SDOrder",
                         {"WantedDate", "NeedsReview"},
                         "SDOrderRow",
@@ -83,8 +82,8 @@ DocumentWriter::DocumentWriter(const DatabaseFile& file)
                         "DeliveredQuantity",
                         100'000})),
       deliveries_(MakeKind(
-          file, {"SDConsignmD", {}, "DDStoreDRow", "IDSDConsignmD", "IDSDOrderRow", 200'000})),
-      invoices_(MakeKind(file,
+          store, {"SDConsignmD", {}, "DDStoreDRow", "IDSDConsignmD", "IDSDOrderRow", 200'000})),
+      invoices_(MakeKind(store,
                          {"SDInvoice",
                           {"DueDate", "PaidAmount"},
                           "SDInvoiceRow",

@@ -4,7 +4,7 @@
 #include <initializer_list>
 #include <string_view>
 
-#include "demo/database_file.h"
+#include "demo/company_store.h"
 #include "demo/random.h"
 #include "demo/trade_document.h"
 
@@ -14,7 +14,7 @@ namespace zebtell::demo {
 // rise in the order of storing.
 class DocumentWriter {
   public:
-    explicit DocumentWriter(const DatabaseFile& file);
+    explicit DocumentWriter(CompanyStore& store);
 
     void WriteOrder(TradeDocument& order);
     void WriteDelivery(TradeDocument& delivery);
@@ -38,7 +38,7 @@ class DocumentWriter {
         std::string_view row_own;
         std::int64_t last_number;
     };
-    static Kind MakeKind(const DatabaseFile& file, const KindColumns& columns);
+    static Kind MakeKind(CompanyStore& store, const KindColumns& columns);
 
     // The GDocument, the link to the document before and the taxes.
     DocumentSums Begin(TradeDocument& document, Kind& kind);

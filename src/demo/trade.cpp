@@ -48,7 +48,7 @@ int StateOf(const TradeDocument& order, bool is_in_process) {
 
 }  // namespace
 
-Trade::Trade(const DatabaseFile& file,
+Trade::Trade(CompanyStore& store,
              const Catalogue& catalogue,
              const std::vector<Buyer>& buyers,
              const DemoOptions& options)
@@ -57,7 +57,7 @@ Trade::Trade(const DatabaseFile& file,
       last_workday_(today_),
       wanted_rows_(options.order_rows),
       orders_(catalogue, buyers),
-      writer_(file) {
+      writer_(store) {
     while (!IsWorkday(last_workday_)) {
         --last_workday_;
     }

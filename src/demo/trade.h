@@ -19,7 +19,7 @@ namespace zebtell::demo {
 // unpaid.
 class Trade {
   public:
-    Trade(const DatabaseFile& file,
+    Trade(CompanyStore& store,
           const Catalogue& catalogue,
           const std::vector<Buyer>& buyers,
           const DemoOptions& options);

@@ -30,8 +30,8 @@ constexpr std::string_view kCommonPassword = "klient-demo";
 
 class UserWriter {
   public:
-    explicit UserWriter(const DatabaseFile& file)
-        : users_(file,
+    explicit UserWriter(CompanyStore& store)
+        : users_(store,
                  "SYUser",
                  {"Name",
                   "PasswordHash",
@@ -57,8 +57,8 @@ class UserWriter {
 
 }  // namespace
 
-void WriteUsers(const DatabaseFile& file, const std::vector<Buyer>& buyers) {
-    UserWriter writer(file);
+void WriteUsers(CompanyStore& store, const std::vector<Buyer>& buyers) {
+    UserWriter writer(store);
     for (const UserRow& user : kKnownUsers) {
         const Buyer& buyer = buyers[static_cast<std::size_t>(user.company - 1)];
         writer.Write(user, erp::HashPassword(user.password), user.disabled ? 0 : buyer.contact);

@@ -17,6 +17,15 @@ inline DemoOptions OnAFriday() {
     return options;
 }
 
+inline DemoOptions SmallCompany() {
+    DemoOptions options = OnAFriday();
+    options.articles = 300;
+    options.companies = 12;
+    options.years = 1;
+    options.order_rows = 500;
+    return options;
+}
+
 // The company of the default size, made once for all tests of a suite.
 class DemoCompanyTest : public testing::Test {
   protected:

@@ -10,41 +10,12 @@
 #include "base/runtime_error.h"
 #include "demo/sql_files.h"
 #include "tests/demo/demo_fixture.h"
+#include "tests/demo/digest.h"
 
 namespace zebtell::demo {
 namespace {
 
 namespace fs = std::filesystem;
-
-DemoOptions Small() {
-    DemoOptions options = OnAFriday();
-    options.articles = 300;
-    options.companies = 12;
-    options.years = 1;
-    options.order_rows = 500;
-    return options;
-}
-
-// Of every row of every table, but for the salted hashes.
-std::uint64_t DigestOf(const fs::path& file) {
-    const Sql sql(file);
-    std::uint64_t digest = 14695981039346656037U;  // FNV-1a
-    const auto add = [&digest](const std::string& text) {
-        for (const char byte : text + '\n') {
-            digest = (digest ^ static_cast<unsigned char>(byte)) * 1099511628211U;
-        }
-    };
-    for (const Sql::Row& table : sql.Rows("select name from sqlite_master where type = 'table' "
-                                          "and name not like 'sqlite%' order by name")) {
-        add(table[0]);
-        const bool has_hash = table[0] == "SYUser";
-        for (Sql::Row& row : sql.Rows("select * from " + table[0] + " order by ID")) {
-            if (has_hash) row[2].clear();
-            for (const std::string& value : row) add(value);
-        }
-    }
-    return digest;
-}
 
 // What making the company failed with, "" when it did not.
 std::string FailureOf(const fs::path& file, const DemoOptions& options) {
@@ -62,8 +33,8 @@ bool IsEmpty(const TempFolder& folder) {
 
 TEST(MakingTest, GivesTheSameDataOnEveryMachine) {
     const TempFolder folder;
-    MakeDemoCompany(folder.path() / "a.db", Small());
-    MakeDemoCompany(folder.path() / "b.db", Small());
+    MakeDemoCompany(folder.path() / "a.db", SmallCompany());
+    MakeDemoCompany(folder.path() / "b.db", SmallCompany());
     EXPECT_EQ(DigestOf(folder.path() / "a.db"), DigestOf(folder.path() / "b.db"));
     EXPECT_EQ(DigestOf(folder.path() / "a.db"), 7259847541838216593U)
         << "the data has changed, or depends on "
@@ -72,7 +43,7 @@ TEST(MakingTest, GivesTheSameDataOnEveryMachine) {
 
 TEST(MakingTest, IsAsLargeAsAskedFor) {
     const TempFolder folder;
-    DemoOptions options = Small();
+    DemoOptions options = SmallCompany();
     options.articles = 12'000;  // more than the combinations of most kinds
     options.companies = 90;     // more than there are names
     options.order_rows = 2500;
@@ -88,7 +59,7 @@ TEST(MakingTest, IsAsLargeAsAskedFor) {
 
 TEST(MakingTest, HasTheIndexesOfTheSchemaAndIsInWalMode) {
     const TempFolder folder;
-    MakeDemoCompany(folder.path() / "demo.db", Small());
+    MakeDemoCompany(folder.path() / "demo.db", SmallCompany());
     std::ofstream(folder.path() / "plain.db");
     const Sql plain(folder.path() / "plain.db");
     plain.Rows(std::string(kSchemaSql) + std::string(kViewsSql));
@@ -108,7 +79,7 @@ TEST(MakingTest, RefusesSizesOutOfRange) {
         [](DemoOptions& options) { options.order_rows = 10'000'001; },
     };
     for (const auto& change : changes) {
-        DemoOptions options = Small();
+        DemoOptions options = SmallCompany();
         change(options);
         EXPECT_THAT(FailureOf(folder.path() / "demo.db", options),
                     testing::StartsWith("The number of "));
@@ -120,11 +91,11 @@ TEST(MakingTest, NeverOverwritesAFile) {
     const TempFolder folder;
     const fs::path file = folder.path() / "demo.db";
     folder.Write("demo.db", "orders of years");
-    EXPECT_EQ(FailureOf(file, Small()), "The file " + file.string() + " exists already");
+    EXPECT_EQ(FailureOf(file, SmallCompany()), "The file " + file.string() + " exists already");
     EXPECT_EQ(folder.Read("demo.db"), "orders of years");
 
     fs::rename(file, folder.path() / "demo.db.new");
-    EXPECT_EQ(FailureOf(file, Small()), "The file " + file.string() + ".new exists already");
+    EXPECT_EQ(FailureOf(file, SmallCompany()), "The file " + file.string() + ".new exists already");
     EXPECT_EQ(folder.Read("demo.db.new"), "orders of years");
     EXPECT_FALSE(fs::exists(file));
 }
@@ -138,7 +109,7 @@ TEST(MakingTest, LeavesNothingWhenTheDiskIsFull) {
         struct rlimit limit = before;
         limit.rlim_cur = bytes;
         ASSERT_EQ(setrlimit(RLIMIT_FSIZE, &limit), 0);
-        const std::string failure = FailureOf(folder.path() / "demo.db", Small());
+        const std::string failure = FailureOf(folder.path() / "demo.db", SmallCompany());
         ASSERT_EQ(setrlimit(RLIMIT_FSIZE, &before), 0);
         EXPECT_NE(failure, "") << bytes;
         EXPECT_TRUE(IsEmpty(folder)) << bytes;
@@ -170,7 +141,7 @@ TEST(MakingTest, LeavesNoHalfDatabaseWhenKilled) {
 
 TEST(MakingTest, FailsWhereItMayNotWrite) {
     const TempFolder folder;
-    EXPECT_EQ(FailureOf(folder.path() / "no such folder" / "demo.db", Small()),
+    EXPECT_EQ(FailureOf(folder.path() / "no such folder" / "demo.db", SmallCompany()),
               "unable to open database file");
 }
 

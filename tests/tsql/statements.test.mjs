@@ -52,14 +52,14 @@ test('what SQL Server refuses is refused', () => {
 
 test('SQL Server takes every statement that the runtime asks it', () => {
   const programs = recorded();
-  for (const [program, least] of [['erp_tests', 200], ['portal_tests', 50]]) {
+  for (const [program, least] of [['erp_tests', 200], ['portal_tests', 50], ['demo_tests', 20]]) {
     const statements = programs.get(program) ?? [];
     assert.ok(statements.length >= least, `${program} recorded ${statements.length}`);
     assert.deepEqual(faultsOf(statements), []);
   }
   const all = [...programs.values()].flat().join('\n').toLowerCase();
   const constructs = [
-    'openjson(?) with', "escape '\\'", 'with (nolock)', 'top (', 'with (updlock, holdlock)',
+    'openjson(?) with', 'set identity_insert grarticle on; insert into', "escape '\\'", 'with (nolock)', 'top (', 'with (updlock, holdlock)',
     'insert into sdorderrow', 'update sdorder ', 'delete from gdtax', 'left join', 'exists (',
     'cast(', 'group by', 'count_big', 'nullif(', 'case when', ' as [',
   ];
@@ -79,7 +79,8 @@ test('SQL Server takes the scripts', () => {
 
 test('the login may write what is written, and nothing else', () => {
   const written = new Set();
-  for (const statement of [...recorded().values()].flat()) {
+  const programs = recorded();
+  for (const statement of [...programs.get('erp_tests'), ...programs.get('portal_tests')]) {
     const found = /^(INSERT INTO|UPDATE|DELETE FROM) (\w+)/i.exec(statement);
     if (found) written.add(`${found[1].split(' ')[0].toUpperCase()} ${found[2]}`);
   }
