@@ -64,7 +64,7 @@ std::vector<host::Page> PortalPages() {
          {{"Lisamine", Lisamine_Lisamine}}, kEventsShow},
         {"Lisatud", "zebtell_lisatud.htm", Lisatud_Respond, Shared_ProcessTag, nullptr, {}, kOpen},
         {"Logon", "zebtell_logon.htm", Logon_Respond, Shared_ProcessTag, nullptr,
-         {{"Logon", Logon_Logon, Work::kMayWait}}, kOpen},
+         {{"Logon", Logon_Logon, Work::kLogOn}}, kOpen},
         {"Logout", "zebtell_logout.htm", Logout_Respond, Shared_ProcessTag, nullptr,
          {{"Hyperlink2", Logout_Hyperlink2, Work::kQuick, Effect::kShows}}, kOpenAndChanges},
         {"Raamistik", "zebtell_frame.htm", Raamistik_Respond, Shared_ProcessTag, nullptr, {}, kOpen},

@@ -3,6 +3,7 @@
 #include <string>
 
 #include "base/ignore_errors.h"
+#include "http/client_address.h"
 
 namespace zebtell::app {
 namespace {
@@ -17,7 +18,8 @@ http::Response Plain(int status, std::string text) {
 }
 
 bool IsLoopback(std::string_view address) {
-    return address.starts_with("127.") || address == "::1" || address.starts_with("::ffff:127.");
+    const auto parsed = http::IpAddress::Parse(address);
+    return parsed && parsed->IsLoopback();
 }
 
 void AppendMetric(std::string& out,

@@ -46,25 +46,24 @@ std::optional<User> ReadUser(Connection& connection, std::string_view name) {
     return user;
 }
 
-// Databases compare names without regard to case, though not all of them letters beyond ASCII.
-std::optional<std::string> NameInOtherCase(Connection& connection, std::string_view name) {
+// The name in the letters that the database has, where it knows it. Databases compare names without
+// regard to case, though not all of them letters beyond ASCII. All names are read whoever it is, so
+// that the time does not tell which ones there are.
+std::string NameAsKnown(Connection& connection, std::string_view name) {
     const auto row = connection.Query({"SELECT Name FROM SYUser", {}});
+    std::string found(name);
+    bool is_exact = false;
     while (row->Next()) {
         std::string known = row->Get(0).ToPlainText();
-        if (base::EqualNoCase(known, name)) {
-            return known;
-        }
+        if (is_exact || !base::EqualNoCase(known, name)) continue;
+        is_exact = known == name;
+        found = std::move(known);
     }
-    return std::nullopt;
+    return found;
 }
 
 std::optional<User> FindUser(Connection& connection, std::string_view name) {
-    std::optional<User> user = ReadUser(connection, name);
-    if (!user) {
-        const auto known = NameInOtherCase(connection, name);
-        user = known ? ReadUser(connection, *known) : std::nullopt;
-    }
-    return user;
+    return ReadUser(connection, NameAsKnown(connection, name));
 }
 
 // The lines of a list may be those of another one; whoever sees them reads them there.

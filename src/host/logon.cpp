@@ -93,6 +93,32 @@ void LogOn(SessionState& state, const Settings& settings, const Credentials& cre
     state.logon.Password = credentials.password;
 }
 
+std::string WaitMessage(const Settings& settings, std::chrono::seconds wait) {
+    constexpr LocalText kBefore = {"Liiga palju ebaõnnestunud sisenemisi, proovige uuesti ",
+                                   "Too many failed log-ons, try again after ",
+                                   "Pārāk daudz neveiksmīgu pieteikšanās, mēģiniet vēlreiz pēc "};
+    constexpr LocalText kAfter = {" sekundi pärast!", " seconds!", " sekundēm!"};
+    const UserLanguage language = settings.language();
+    return std::string(kBefore.In(language)) + std::to_string(wait.count()) +
+           std::string(kAfter.In(language));
+}
+
+// Whether the password may be tried now. There is none to guess for a guest.
+bool MayTry(SessionState& state,
+            const web::Request& request,
+            const Settings& settings,
+            const Credentials& credentials) {
+    if (state.logon.IsGuest) return true;
+    const auto wait = state.services.logon_limits.Enter(credentials.user, request.remote_address);
+    if (wait == std::chrono::seconds(0)) return true;
+    state.Message = WaitMessage(settings, wait);
+    WriteLog(state,
+             "Log-on has to wait " + std::to_string(wait.count()) + " s (" +
+                 request.remote_address + ")",
+             log_Detail);
+    return false;
+}
+
 void GoOn(SessionState& state, web::Call& call) {
     const std::string page = std::exchange(state.logon.ReturnPage, {});
     call.RedirectTo(page.empty() ? "Raamistik" : std::string_view(page));
@@ -128,6 +154,7 @@ void Logon_Logon(SessionState& state, web::Call& call) {
         }
         ResetUserState(state);
     }
+    if (!MayTry(state, call.request, *settings, credentials)) return call.RedirectTo("Logon");
     const auto refuse = [&] {
         CountFailure(state, *settings, credentials.user);
         state.Message = kInvalid.In(settings->language());
@@ -135,6 +162,9 @@ void Logon_Logon(SessionState& state, web::Call& call) {
     };
     const auto enter = [&] {
         LogOn(state, *settings, credentials);
+        if (!state.logon.IsGuest) {
+            state.services.logon_limits.Succeeded(credentials.user, call.request.remote_address);
+        }
         call.RenewToken();
         WriteLog(state, LoggedInEntry(call.request, credentials.user), log_Normal);
         GoOn(state, call);

@@ -2,6 +2,7 @@
 
 #include "base/clock.h"
 #include "data/data_application.h"
+#include "host/logon_limits.h"
 #include "host/settings.h"
 
 namespace zebtell::host {
@@ -11,6 +12,7 @@ struct Services {
     SettingsStore& settings;
     data::DataApplicationFactory make_application;
     base::Clock clock;
+    LogonLimits logon_limits{};
 };
 
 }  // namespace zebtell::host

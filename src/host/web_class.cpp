@@ -13,6 +13,11 @@ DateRange ThisMonth(base::DateTime today) {
     return {base::DateTime(today.days() - today.Calendar().day + 1), today};
 }
 
+web::Standing StandingOf(const SessionState& state) {
+    if (!state.logon.LoggedOn) return web::Standing::kAnonymous;
+    return state.logon.IsGuest ? web::Standing::kGuest : web::Standing::kUser;
+}
+
 }  // namespace
 
 void WebClass_Initialize(SessionState& state) {
@@ -62,16 +67,16 @@ void WebClass_Terminate(SessionState& state) {
 }
 
 web::WebClass<SessionState> WebClassHooks() {
-    return {
-        .BeginRequest = WebClass_BeginRequest,
-        .Start = WebClass_Start,
-        .EndRequest = WebClass_EndRequest,
-        .FatalErrorResponse = WebClass_FatalErrorResponse,
-        .Terminate = WebClass_Terminate,
-        .IsLoggedOn = [](const SessionState& state) { return state.logon.LoggedOn; },
-        .CheckLogon = CheckLogon,
-        .Language =
-            [](const SessionState& state) { return LanguageCode(state.settings()->language()); }};
+    return {.BeginRequest = WebClass_BeginRequest,
+            .Start = WebClass_Start,
+            .EndRequest = WebClass_EndRequest,
+            .FatalErrorResponse = WebClass_FatalErrorResponse,
+            .Terminate = WebClass_Terminate,
+            .StandingOf = StandingOf,
+            .CheckLogon = CheckLogon,
+            .Language = [](const SessionState& state) {
+                return LanguageCode(state.settings()->language());
+            }};
 }
 
 std::unique_ptr<SessionState> NewSession(Services& services) {

@@ -57,6 +57,18 @@ bool IpAddress::IsV4() const {
     return std::equal(kV4Prefix.begin(), kV4Prefix.end(), bytes_.begin());
 }
 
+bool IpAddress::IsLoopback() const {
+    constexpr std::array<std::uint8_t, 16> kV6Loopback = {
+        0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 1};
+    return IsV4() ? bytes_[kV4Prefix.size()] == 127 : bytes_ == kV6Loopback;
+}
+
+IpAddress IpAddress::Network() const {
+    IpAddress network = *this;
+    if (!IsV4()) std::fill(network.bytes_.begin() + 8, network.bytes_.end(), std::uint8_t{0});
+    return network;
+}
+
 std::string IpAddress::ToText() const {
     std::array<char, INET6_ADDRSTRLEN> text{};
     if (IsV4()) {

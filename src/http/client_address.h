@@ -18,6 +18,9 @@ class IpAddress {
 
     std::string ToText() const;
     bool IsV4() const;
+    bool IsLoopback() const;
+    // What one customer holds: an IPv4 address alone, of IPv6 the /64 network.
+    IpAddress Network() const;
     // Whether the first `bits` of both are the same; counted from the start of the 128-bit form.
     bool SharesPrefix(const IpAddress& other, int bits) const;
 

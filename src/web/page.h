@@ -9,9 +9,13 @@
 
 namespace zebtell::web {
 
-// Whether a handler can hold its thread up (a commit, a password hash, a search over a whole list,
-// a database on the network) and so may not run on an IO thread.
-enum class Work { kQuick, kMayWait };
+// Whether a handler can hold its thread up (a commit, a search over a whole list, a database on the
+// network) and so may not run on an IO thread; a log-on, which takes processor time on purpose, has
+// threads of its own.
+enum class Work { kQuick, kMayWait, kLogOn };
+
+// Who a session is to the server, from the first to go when there are too many to the last.
+enum class Standing { kAnonymous, kGuest, kUser };
 
 // Who may ask for a page: without a log-on nobody reaches a handler or a tag of a page that is for
 // kLoggedOn.
@@ -61,7 +65,7 @@ struct WebClass {
     // made false.
     void (*FatalErrorResponse)(State&, Call&, const std::exception& error, bool& SendDefault);
     void (*Terminate)(State&);
-    bool (*IsLoggedOn)(const State&);
+    Standing (*StandingOf)(const State&);
     // For pages that are for kLoggedOn: whether the request may go on. When not, the response is
     // written. Null: everybody may.
     bool (*CheckLogon)(State&, Call&) = nullptr;

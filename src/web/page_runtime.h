@@ -80,7 +80,7 @@ Site MakeSite(const std::vector<Page<State>>& table,
                     .start = OnInstance(web_class.Start),
                     .end_request = OnInstance(web_class.EndRequest),
                     .fatal = OnInstance(web_class.FatalErrorResponse),
-                    .is_logged_on = OnConstInstance(web_class.IsLoggedOn),
+                    .standing_of = OnConstInstance(web_class.StandingOf),
                     .check_logon = OnInstance(web_class.CheckLogon),
                     .language = OnConstInstance(web_class.Language)};
     return Site(std::move(pages), std::move(hooks));

@@ -25,15 +25,20 @@ class SerialQueue : public std::enable_shared_from_this<SerialQueue> {
     bool Submit(Task task, Work work);
 
   private:
-    void PostNext();
+    struct Waiting {
+        Task task;
+        Work work;
+    };
+
+    void PostNext(Work work);
     void RunOne();  // on the pool
     void Finish();
 
     WorkerPool& pool_;
     const std::size_t limit_;
     std::mutex mutex_;
-    bool is_running_ = false;    // a task runs or the next one is posted
-    std::vector<Task> waiting_;  // the first is next
+    bool is_running_ = false;       // a task runs or the next one is posted
+    std::vector<Waiting> waiting_;  // the first is next
 };
 
 }  // namespace zebtell::web

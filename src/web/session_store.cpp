@@ -1,5 +1,6 @@
 #include "web/session_store.h"
 
+#include <algorithm>
 #include <utility>
 
 namespace zebtell::web {
@@ -18,7 +19,7 @@ std::shared_ptr<Session> SessionStore::Find(std::string_view token) {
         expired = Remove(entry);
         return nullptr;
     }
-    Use(entry, entry->logged_on);
+    Use(entry, entry->standing);
     return entry->session;
 }
 
@@ -28,23 +29,35 @@ std::optional<SessionStore::Created> SessionStore::Create() {
     auto queue = std::make_shared<SerialQueue>(pool_, options_.queue_limit);
     const std::lock_guard lock(mutex_);
     if (by_key_.size() >= options_.max_sessions) {
-        const bool has_expired = !logged_on_.empty() && IsExpired(logged_on_.front());
-        Entries& from = ListOf(has_expired);
-        if (from.empty()) return std::nullopt;
-        created.evicted = Remove(from.begin());
+        created.evicted = MakeRoom();
+        if (created.evicted == nullptr) return std::nullopt;
     }
     created.session = std::make_shared<Session>(std::to_string(next_number_++), std::move(queue));
     created.session->key_ = TokenKey::Of(created.token);
-    const auto entry =
-        anonymous_.insert(anonymous_.end(), {created.session, options_.clock(), false});
+    Entries& anonymous = ListOf(Standing::kAnonymous);
+    const auto entry = anonymous.insert(anonymous.end(), {created.session, options_.clock()});
     by_key_.emplace(created.session->key_, entry);
     return created;
 }
 
-void SessionStore::Touch(const Session& session, bool logged_on) {
+std::shared_ptr<Session> SessionStore::MakeRoom() {
+    for (Entries& entries : entries_) {
+        if (!entries.empty() && IsExpired(entries.front())) return Remove(entries.begin());
+    }
+    // Who has a request under way, such as a log-on that waits for its turn, holds the session too.
+    const auto is_unused = [](const Entry& entry) { return entry.session.use_count() == 1; };
+    for (const Standing standing : {Standing::kAnonymous, Standing::kGuest}) {
+        Entries& entries = ListOf(standing);
+        const auto found = std::find_if(entries.begin(), entries.end(), is_unused);
+        if (found != entries.end()) return Remove(found);
+    }
+    return nullptr;
+}
+
+void SessionStore::Touch(const Session& session, Standing standing) {
     const std::lock_guard lock(mutex_);
     const auto found = by_key_.find(session.key_);
-    if (found != by_key_.end()) Use(found->second, logged_on);
+    if (found != by_key_.end()) Use(found->second, standing);
 }
 
 std::optional<std::string> SessionStore::RenewToken(Session& session) {
@@ -60,9 +73,9 @@ std::optional<std::string> SessionStore::RenewToken(Session& session) {
 std::vector<std::shared_ptr<Session>> SessionStore::TakeExpired() {
     std::vector<std::shared_ptr<Session>> taken;
     const std::lock_guard lock(mutex_);
-    for (Entries* entries : {&anonymous_, &logged_on_}) {
-        while (!entries->empty() && IsExpired(entries->front()))
-            taken.push_back(Remove(entries->begin()));
+    for (Entries& entries : entries_) {
+        while (!entries.empty() && IsExpired(entries.front()))
+            taken.push_back(Remove(entries.begin()));
     }
     return taken;
 }
@@ -70,28 +83,28 @@ std::vector<std::shared_ptr<Session>> SessionStore::TakeExpired() {
 std::vector<std::shared_ptr<Session>> SessionStore::TakeAll() {
     std::vector<std::shared_ptr<Session>> taken;
     const std::lock_guard lock(mutex_);
-    for (Entries* entries : {&anonymous_, &logged_on_})
-        while (!entries->empty()) taken.push_back(Remove(entries->begin()));
+    for (Entries& entries : entries_)
+        while (!entries.empty()) taken.push_back(Remove(entries.begin()));
     return taken;
 }
 
 SessionStore::Counts SessionStore::Count() const {
     const std::lock_guard lock(mutex_);
-    return {by_key_.size(), logged_on_.size()};
+    return {by_key_.size(), by_key_.size() - entries_.front().size()};
 }
 
-void SessionStore::Use(Entries::iterator entry, bool logged_on) {
-    Entries& from = ListOf(entry->logged_on);
-    Entries& to = ListOf(logged_on);
+void SessionStore::Use(Entries::iterator entry, Standing standing) {
+    Entries& from = ListOf(entry->standing);
+    Entries& to = ListOf(standing);
     entry->last_used = options_.clock();
-    entry->logged_on = logged_on;
+    entry->standing = standing;
     to.splice(to.end(), from, entry);
 }
 
 std::shared_ptr<Session> SessionStore::Remove(Entries::iterator entry) {
     std::shared_ptr<Session> session = std::move(entry->session);
     by_key_.erase(session->key_);
-    ListOf(entry->logged_on).erase(entry);
+    ListOf(entry->standing).erase(entry);
     return session;
 }
 

@@ -63,12 +63,13 @@ class SessionStore {
 
     // Null for a token that is unknown or whose session has been idle for too long. Counts as use.
     std::shared_ptr<Session> Find(std::string_view token);
-    // When the store is full, the session that has been idle longest among those not logged on
-    // goes; nothing when all are logged on.
+    // When the store is full, the session that has been idle longest goes, guests only when nobody
+    // is anonymous, users and those with requests under way never; nothing when there are no
+    // others.
     std::optional<Created> Create();
 
     // A request of the session has ended.
-    void Touch(const Session& session, bool logged_on);
+    void Touch(const Session& session, Standing standing);
     // The session's new token; the old one is unknown from now on. Nothing when the session has
     // left.
     std::optional<std::string> RenewToken(Session& session);
@@ -82,20 +83,20 @@ class SessionStore {
     struct Entry {
         std::shared_ptr<Session> session;
         std::chrono::steady_clock::time_point last_used;
-        bool logged_on = false;
+        Standing standing = Standing::kAnonymous;
     };
     using Entries = std::list<Entry>;  // the longest idle first
 
-    Entries& ListOf(bool logged_on) { return logged_on ? logged_on_ : anonymous_; }
-    void Use(Entries::iterator entry, bool logged_on);
+    Entries& ListOf(Standing standing) { return entries_[static_cast<std::size_t>(standing)]; }
+    void Use(Entries::iterator entry, Standing standing);
+    std::shared_ptr<Session> MakeRoom();
     std::shared_ptr<Session> Remove(Entries::iterator entry);
     bool IsExpired(const Entry& entry) const;
 
     WorkerPool& pool_;
     const Options options_;
     mutable std::mutex mutex_;
-    Entries anonymous_;
-    Entries logged_on_;
+    std::array<Entries, 3> entries_;  // by standing
     std::unordered_map<TokenKey, Entries::iterator, TokenKeyHash> by_key_;
     std::uint32_t next_number_ = FirstSessionNumber();
 };

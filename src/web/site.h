@@ -52,7 +52,7 @@ struct SiteHooks {
     std::function<void(SessionInstance&, Call&)> start;
     std::function<void(SessionInstance&, Call&)> end_request;
     std::function<void(SessionInstance&, Call&, const std::exception&, bool& send_default)> fatal;
-    std::function<bool(const SessionInstance&)> is_logged_on;
+    std::function<Standing(const SessionInstance&)> standing_of;
     std::function<bool(SessionInstance&, Call&)> check_logon;
     std::function<std::string_view(const SessionInstance&)> language;
 };

@@ -36,13 +36,14 @@ struct SiteRuntime::Job {
     std::shared_ptr<Session> session;
     std::string new_token;  // to be sent as a cookie; "": the browser has it
     bool secure = false;
+    std::shared_ptr<void> place;  // among the log-ons, where it is one
 };
 
 SiteRuntime::SiteRuntime(Site site, markup::TemplateCache& templates, RuntimeOptions options)
     : site_(std::move(site)),
       options_(Checked(std::move(options))),
       context_{site_, templates, options_.base_path},
-      pool_(options_.worker_threads),
+      pool_(options_.worker_threads, options_.worker_threads / 2),
       sessions_(
           pool_,
           {options_.session_idle, options_.max_sessions, options_.queue_limit, options_.clock}) {
@@ -77,6 +78,10 @@ void SiteRuntime::Handle(const http::Request& request, http::Responder respond) 
     job->respond = std::move(respond);
     job->secure = request.secure;
     const Work work = WorkOf(job->request);
+    if (work == Work::kLogOn) {
+        job->place = TakePlace();
+        if (job->place == nullptr) return job->respond(PlainPage(503));
+    }
     if (!job->session->queue->Submit([this, job] { Run(*job); }, work))
         job->respond(PlainPage(503));
 }
@@ -93,11 +98,19 @@ std::shared_ptr<Session> SiteRuntime::SessionFor(const http::Request& request,
     return created->session;
 }
 
+// A place among the log-ons until the last copy is gone; null: all are taken.
+std::shared_ptr<void> SiteRuntime::TakePlace() {
+    if (log_ons_.fetch_add(1) < options_.most_log_ons)
+        return {this, [](SiteRuntime* runtime) { runtime->log_ons_.fetch_sub(1); }};
+    log_ons_.fetch_sub(1);
+    return nullptr;
+}
+
 Work SiteRuntime::WorkOf(const Request& request) const {
-    if (!options_.quick_on_io_threads) return Work::kMayWait;
     const SitePage* page = site_.Find(request.page);
     const SiteEvent* event = page == nullptr ? nullptr : page->FindEvent(request.event);
-    return event == nullptr ? Work::kQuick : event->work;
+    const Work work = event == nullptr ? Work::kQuick : event->work;
+    return work == Work::kQuick && !options_.quick_on_io_threads ? Work::kMayWait : work;
 }
 
 void SiteRuntime::Run(Job& job) {
@@ -124,9 +137,10 @@ http::Response SiteRuntime::RunPage(Job& job) {
         if (auto token = sessions_.RenewToken(session)) job.new_token = std::move(*token);
     }
     if (result.release_instance) session.instance.reset();
-    const bool logged_on = session.instance != nullptr && site_.hooks().is_logged_on &&
-                           site_.hooks().is_logged_on(*session.instance);
-    sessions_.Touch(session, logged_on);
+    const auto& standing_of = site_.hooks().standing_of;
+    sessions_.Touch(session,
+                    session.instance != nullptr && standing_of ? standing_of(*session.instance)
+                                                               : Standing::kAnonymous);
     return std::move(result.response);
 }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <atomic>
 #include <chrono>
 #include <functional>
 #include <memory>
@@ -21,6 +22,7 @@ struct RuntimeOptions {
     std::chrono::minutes session_idle{20};
     std::size_t max_sessions = 10'000;
     std::size_t queue_limit = 32;  // requests of one session that wait
+    int most_log_ons = 64;         // that wait or run, of all sessions; more are told to come again
     unsigned worker_threads = 0;   // 0: one for each core
     // False when every request can wait, as with a database over the network: then none runs on the
     // thread that read it.
@@ -54,6 +56,7 @@ class SiteRuntime {
     struct Job;
 
     std::shared_ptr<Session> SessionFor(const http::Request& request, std::string& new_token);
+    std::shared_ptr<void> TakePlace();
     Work WorkOf(const Request& request) const;
     void Run(Job& job);
     http::Response RunPage(Job& job);
@@ -61,6 +64,7 @@ class SiteRuntime {
     const Site site_;
     const RuntimeOptions options_;
     const CycleContext context_;
+    std::atomic<int> log_ons_ = 0;  // that wait or run
     WorkerPool pool_;
     SessionStore sessions_;
 };

@@ -4,17 +4,21 @@
 #include <functional>
 #include <memory>
 
+#include "web/page.h"
+
 namespace zebtell::web {
 
-// The threads for work that may wait. Tasks may not throw.
+// The threads for work that may wait, and fewer of them, at a lower priority, for log-ons: however
+// many passwords are being hashed, pages have the processor first. Tasks may not throw.
 class WorkerPool {
   public:
-    explicit WorkerPool(unsigned threads);  // at least one
-    ~WorkerPool();                          // stops
+    // At least one of each kind.
+    explicit WorkerPool(unsigned threads, unsigned log_on_threads = 1);
+    ~WorkerPool();  // stops
     WorkerPool(const WorkerPool&) = delete;
     WorkerPool& operator=(const WorkerPool&) = delete;
 
-    void Post(std::function<void()> task);
+    void Post(std::function<void()> task, Work work = Work::kMayWait);
     // Runs a task again and again until the pool stops. Call it before Stop.
     void Every(std::chrono::milliseconds period, std::function<void()> task);
 

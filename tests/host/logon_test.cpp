@@ -152,6 +152,24 @@ TEST(Logon, HugeNamesAreRefusedAndNotKept) {
     EXPECT_LT(s.Log().size(), 1000U);
 }
 
+// A guesser begins a new session for every try.
+TEST(Logon, NewSessionsAreNoWayAroundTheLimit) {
+    TestSession s("[Session]\nBlocking=0\n[DataBase]\nLanguage=EN\n");
+    const auto try_in_new_session = [&](const char* user, const char* password) {
+        s.state = NewSession(s.services);
+        s.Ask(Logon_Logon, Form(user, password));
+        return s.state->Message;
+    };
+    for (int i = 0; i < 50; ++i) {
+        ASSERT_EQ(try_in_new_session("mari", "wrong"), "Invalid user name or password!");
+    }
+    const std::string wait = "Too many failed log-ons, try again after 60 seconds!";
+    EXPECT_EQ(try_in_new_session("mari", "Sala"), wait) << "also with the right password";
+    EXPECT_EQ(try_in_new_session("MARI", "wrong"), wait);
+    EXPECT_EQ(s.state->blocking.FailedAttempts, 0);
+    EXPECT_EQ(try_in_new_session("nobody", "wrong"), "Invalid user name or password!");
+}
+
 TEST(Logout, OfASessionThatIsNotLoggedOn) {
     TestSession s;
     s.Ask(Logout_Respond);

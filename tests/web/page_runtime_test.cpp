@@ -266,6 +266,32 @@ TEST(PageRuntime, RefusesATableWithNamesTwice) {
     EXPECT_NO_THROW(make({PageWithEvents("A", {"E"}), PageWithEvents("B", {"E"})}));
 }
 
+// However many log-ons wait, the others are answered, and what is too much is told so.
+TEST(PageRuntime, AFloodOfLogOnsIsBoundedAndHoldsNobodyUp) {
+    RuntimeOptions options;
+    options.worker_threads = 1;
+    options.most_log_ons = 3;
+    options.quick_on_io_threads = false;
+    TestSite site(std::move(options));
+    std::promise<void> may_end;
+    site.meet = [end = may_end.get_future().share()] { end.wait(); };
+    std::array<std::promise<int>, 5> answers;
+    for (auto& answer : answers) {
+        site.runtime()({.method = "POST",
+                        .target = "/?page=Esimene&event=Logi",
+                        .headers = {},
+                        .body = {},
+                        .remote_address = {}},
+                       [&](const http::Response& response) { answer.set_value(response.status); });
+    }
+    EXPECT_EQ(answers[3].get_future().get(), 503);
+    EXPECT_EQ(answers[4].get_future().get(), 503);
+    EXPECT_EQ(Browser(site).Get("/?page=Teine").body, "second Teine");
+    may_end.set_value();
+    for (int i = 0; i < 3; ++i) EXPECT_EQ(answers[i].get_future().get(), 200);
+    EXPECT_EQ(Browser(site).Get("/?page=Esimene&event=Logi").status, 200) << "there is room again";
+}
+
 // Each session's handler waits until the other session's runs too: it would never end if sessions
 // waited for one another.
 TEST(PageRuntime, SessionsRunInParallel) {

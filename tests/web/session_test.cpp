@@ -27,7 +27,7 @@ TEST_F(SessionStoreTest, IdleSessionsExpire) {
     const auto used = Make();
     now += std::chrono::minutes(5);
     const auto idle = Make();
-    store.Touch(*idle.session, true);
+    store.Touch(*idle.session, Standing::kUser);
     now += std::chrono::minutes(15);
     EXPECT_EQ(store.Find(used.token), used.session);
     now += std::chrono::minutes(5) + std::chrono::seconds(1);
@@ -37,27 +37,35 @@ TEST_F(SessionStoreTest, IdleSessionsExpire) {
     EXPECT_EQ(store.TakeExpired(), std::vector{used.session});
     EXPECT_EQ(store.Find(used.token), nullptr);
     EXPECT_EQ(store.Count().all, 0U);
-    store.Touch(*used.session, true);  // its last request ends after it has left
+    store.Touch(*used.session, Standing::kUser);  // its last request ends after it has left
     EXPECT_FALSE(store.RenewToken(*used.session));
     EXPECT_EQ(store.Count().all, 0U);
 }
 
-TEST_F(SessionStoreTest, AFullStoreLetsTheLongestIdleAnonymousSessionGo) {
-    const auto logged_on = Make();
-    store.Touch(*logged_on.session, true);
-    const auto older = Make();
-    const auto newer = Make();
-    store.Find(older.token);
-    const auto fourth = Make();
-    EXPECT_EQ(fourth.evicted, newer.session);
-    EXPECT_EQ(store.Find(newer.token), nullptr);
-    EXPECT_EQ(store.Find(older.token), older.session);
-    store.Touch(*older.session, true);
-    store.Touch(*fourth.session, true);
+TEST_F(SessionStoreTest, AFullStoreLetsTheLongestIdleAndLeastKnownSessionGo) {
+    const auto make = [&](Standing standing) {
+        auto made = Make();
+        store.Touch(*made.session, standing);
+        return std::pair(std::move(made.token), std::move(made.evicted));
+    };
+    const auto is_there = [&](const std::string& token) { return store.Find(token) != nullptr; };
+    const std::string user = make(Standing::kUser).first;
+    const std::string guest = make(Standing::kGuest).first;
+    const std::string first = make(Standing::kAnonymous).first;
+    const auto [second, evicted] = make(Standing::kAnonymous);
+    EXPECT_TRUE(evicted) << "is destroyed by the caller, not under the lock";
+    EXPECT_TRUE(!is_there(first) && is_there(second) && is_there(guest));
+    const auto running = store.Find(second);
+    const auto third = Make();
+    EXPECT_TRUE(!is_there(guest) && is_there(second)) << "has a request under way";
+    EXPECT_FALSE(store.Create()) << "user, running, running";
+    store.Touch(*third.session, Standing::kUser);
+    store.Touch(*running, Standing::kUser);
     EXPECT_EQ(store.Count().logged_on, 3U);
-    EXPECT_FALSE(store.Create()) << "nobody who is logged on is pushed out";
-    store.Touch(*older.session, false);
-    EXPECT_EQ(Make().evicted, older.session);
+    EXPECT_FALSE(store.Create()) << "no user is pushed out";
+    now += std::chrono::minutes(21);
+    EXPECT_TRUE(store.Create()) << "but who is gone is";
+    EXPECT_FALSE(is_there(user));
 }
 
 TEST_F(SessionStoreTest, TokensAreUnguessableAndRenewed) {
@@ -83,10 +91,11 @@ TEST_F(SessionStoreTest, ManyThreadsUseItAtOnce) {
                 auto made = store.Create();
                 if (!made) continue;
                 store.Find(made->token);
-                store.Touch(*made->session, round % 2 == 0);
+                store.Touch(*made->session,
+                            round % 2 == 0 ? Standing::kUser : Standing::kAnonymous);
                 store.RenewToken(*made->session);
                 if (i == 0) store.TakeExpired();
-                store.Touch(*made->session, false);
+                store.Touch(*made->session, Standing::kAnonymous);
             }
         });
     }

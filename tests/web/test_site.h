@@ -119,7 +119,8 @@ inline std::vector<Page<TestState>> TestPages() {
           {"Number", Esimene_Number},
           {"Sisene", Esimene_Sisene, Work::kMayWait},
           {"Valju", Esimene_Valju},
-          {"Oota", Esimene_Oota, Work::kMayWait}}},
+          {"Oota", Esimene_Oota, Work::kMayWait},
+          {"Logi", Esimene_Oota, Work::kLogOn}}},
         {"Teine", "teine.htm", Teine_Respond, nullptr, nullptr, {}},
         {"Mall", "teine.htm", nullptr, nullptr, Esimene_UserEvent, {{"Vaikne", Esimene_Vaikne}}},
         {"Ring", "teine.htm", Ring_Respond, nullptr, nullptr, {}},
@@ -147,7 +148,10 @@ inline WebClass<TestState> TestHooks() {
                 SendDefault = false;
             },
         .Terminate = [](TestState& state) { state.journal.Add("terminate"); },
-        .IsLoggedOn = [](const TestState& state) { return state.logged_on; },
+        .StandingOf =
+            [](const TestState& state) {
+                return state.logged_on ? Standing::kUser : Standing::kAnonymous;
+            },
     };
 }
 
