@@ -96,7 +96,7 @@ class ConnectionStore::TableRows : public RowWriter {
 
 ConnectionStore::ConnectionStore(erp::Backend& backend)
     : dialect_(backend.dialect()), connection_(backend.Connect(erp::Access::kWrite)) {
-    if (!backend.Describe(*connection_).tables.empty()) {
+    if (!connection_->Describe().tables.empty()) {
         throw base::RuntimeError(
             base::errors::kInvalidCall,
             "The database is not empty: the demo company needs one of its own");

@@ -47,6 +47,7 @@ class StandIn : public erp::sqlite::SqliteBackend {
         }
         void Commit() override { inner_->Commit(); }
         void Rollback() noexcept override { inner_->Rollback(); }
+        erp::DatabaseDescription Describe() override { return inner_->Describe(); }
 
       private:
         std::unique_ptr<Connection> inner_;
