@@ -110,7 +110,8 @@ const StatementRow kStatements[] = {
      "t2.Price > ?)) <- %100\\\\%%, %[new] _ %, [20,10], 100",
      "select t1.ID as ID from GRArticle t1 where (t1.Name like ? escape '\\' or t1.Name like ? "
      "escape '\\' or exists (select t2.ID, t2.IDGRPriceList, t2.IDGRArticle, t2.Price from "
-     "GRPriceListRel t2 where t2.IDGRPriceList in (select value from openjson(?) with (value "
+     "GRPriceListRel t2 where t2.IDGRPriceList in (select value from openjson(cast(? as "
+     "nvarchar(max))) with (value "
      "bigint '$')) and t2.IDGRArticle = t1.ID and t2.Price > ?)) <- %100\\\\%%, %\\[new] _ %, "
      "[20,10], 100",
      "4"},
@@ -118,8 +119,10 @@ const StatementRow kStatements[] = {
      "ID in (1+1) order by ID",
      nullptr,
      "select t1.ID as ID from GRArticle t1 where (t1.Code in (select cast(value as nvarchar(20)) "
-     "from openjson(?) with (value bigint '$')) or t1.Code in (?, ?) or t1.ID in (select value "
-     "from openjson(?) with (value bigint '$')) or t1.ID in ((? + ?))) order by t1.ID <- [10,20], "
+     "from openjson(cast(? as nvarchar(max))) with (value bigint '$')) or t1.Code in (?, ?) or "
+     "t1.ID in (select value "
+     "from openjson(cast(? as nvarchar(max))) with (value bigint '$')) or t1.ID in ((? + ?))) "
+     "order by t1.ID <- [10,20], "
      "V100, x, [], 1, 1",
      "2;3"},
     {"select x.n, (select max(Price) from GRPriceListRel where IDGRArticle=x.k) from (select top 2 "
@@ -128,7 +131,8 @@ const StatementRow kStatements[] = {
      "(select value from json_each(?)) and t3.IDGRArticle = t2.k) as Column2 from (select t1.Name "
      "as n, t1.ID as k from GRArticle t1 order by t1.ID desc limit 2) t2 order by t2.k <- [20,10]",
      "select t2.n as n, (select max(t3.Price) from GRPriceListRel t3 where t3.IDGRPriceList in "
-     "(select value from openjson(?) with (value bigint '$')) and t3.IDGRArticle = t2.k) as "
+     "(select value from openjson(cast(? as nvarchar(max))) with (value bigint '$')) and "
+     "t3.IDGRArticle = t2.k) as "
      "Column2 from "
      "(select top (2) t1.Name as n, t1.ID as k from GRArticle t1 order by t1.ID desc) t2 order by "
      "t2.k <- [20,10]",

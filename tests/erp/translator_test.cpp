@@ -277,10 +277,12 @@ TEST(TranslatorTest, PriceQueryOfBothDatabases) {
               "t3.IDGRArticlePriceCat = t2.IDGRArticlePriceCat inner join GRCompany t4 with "
               "(nolock) on t4.IDGRCompanyPriceCat = t2.IDGRCompanyPriceCat and t4.ID in (?, ?, ?) "
               "where t2.IDGRCompanyPriceCat = ? and t4.ID = ? and t3.ID in (select value from "
-              "openjson(?) with (value bigint '$'))) t5 on t1.IDGRArticle = t5.idgrarticle and "
+              "openjson(cast(? as nvarchar(max))) with (value bigint '$'))) t5 on "
+              "t1.IDGRArticle = t5.idgrarticle and "
               "t1.IDSrcPriceList = t5.IDGRPriceList where t1.IDGRPriceList in (select value from "
-              "openjson(?) with (value bigint '$')) and t1.IDGRPriceList = ? and t1.IDGRArticle in "
-              "(select value from openjson(?) with (value bigint '$'))" +
+              "openjson(cast(? as nvarchar(max))) with (value bigint '$')) and t1.IDGRPriceList "
+              "= ? and t1.IDGRArticle in "
+              "(select value from openjson(cast(? as nvarchar(max))) with (value bigint '$'))" +
                   values);
 }
 

@@ -59,7 +59,7 @@ test('SQL Server takes every statement that the runtime asks it', () => {
   }
   const all = [...programs.values()].flat().join('\n').toLowerCase();
   const constructs = [
-    'openjson(?) with', 'set identity_insert grarticle on; insert into', "escape '\\'", 'with (nolock)', 'top (', 'with (updlock, holdlock)',
+    'openjson(cast(? as nvarchar(max))) with', 'set identity_insert grarticle on; insert into', "escape '\\'", 'with (nolock)', 'top (', 'with (updlock, holdlock)',
     'insert into sdorderrow', 'update sdorder ', 'delete from gdtax', 'left join', 'exists (',
     'cast(', 'group by', 'count_big', 'nullif(', 'case when', ' as [',
   ];

@@ -14,10 +14,7 @@ class OdbcConnection::OpenCursor : public Cursor {
   public:
     OpenCursor(OdbcConnection& connection, std::string text, const std::vector<base::Value>& values)
         : connection_(connection), text_(std::move(text)) {
-        if (connection.reading_) {
-            throw base::RuntimeError(base::errors::kInvalidCall,
-                                     "The connection's last result is still open");
-        }
+        connection.RefuseSecondResult();
         statement_ = connection.statements_.Take(text_);
         statement_->Run(values);
         connection.reading_ = true;
@@ -80,10 +77,25 @@ OdbcConnection::OdbcConnection(std::shared_ptr<Environment> environment,
     Run(access == Access::kRead ? kind.set_up_read : kind.set_up_write);
 }
 
-void OdbcConnection::Run(const std::string& text) {
-    if (!text.empty()) {
-        OpenCursor(*this, text, {}).Finish();
+void OdbcConnection::RefuseSecondResult() const {
+    if (reading_) {
+        throw base::RuntimeError(base::errors::kInvalidCall,
+                                 "The connection's last result is still open");
     }
+}
+
+// Not prepared: to SQL Server a prepared statement is a procedure, which settings and transactions
+// do not outlive.
+void OdbcConnection::Run(const std::string& text) {
+    if (text.empty()) {
+        return;
+    }
+    RefuseSecondResult();
+    Statement statement(link_);
+    std::u16string wide = ToUtf16(text);
+    statement.RunWith(
+        [&wide](SQLHSTMT handle) { return SQLExecDirectW(handle, Wide(wide), SQL_NTS); });
+    statement.Finish();
 }
 
 std::unique_ptr<Cursor> OdbcConnection::Query(const BoundSql& sql) {
@@ -91,7 +103,11 @@ std::unique_ptr<Cursor> OdbcConnection::Query(const BoundSql& sql) {
 }
 
 void OdbcConnection::Execute(const BoundSql& sql) {
-    OpenCursor(*this, sql.text, sql.values).Finish();
+    if (sql.values.empty()) {
+        Run(sql.text);
+    } else {
+        OpenCursor(*this, sql.text, sql.values).Finish();
+    }
 }
 
 std::int64_t OdbcConnection::Insert(const BoundSql& sql) {

@@ -51,6 +51,7 @@ class OdbcConnection : public Connection {
   private:
     class OpenCursor;
 
+    void RefuseSecondResult() const;
     void Run(const std::string& text);
     std::int64_t ReadKey(const BoundSql& sql);
 

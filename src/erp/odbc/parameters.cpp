@@ -7,9 +7,9 @@
 namespace zebtell::erp::odbc {
 namespace {
 
-// One length for all texts, so that the server makes one plan; longer ones have no limit.
+// One length for all texts, so that the server makes one plan. Longer ones are of the type without
+// a limit; drivers cut off what is too long for the other.
 constexpr SQLULEN kTextLength = 4000;
-constexpr SQLULEN kUnlimited = 0;
 constexpr SQLULEN kDecimalDigits = 19;
 constexpr SQLULEN kTimeLength = 23;  // "2026-11-21 14:05:09.000"
 constexpr SQLSMALLINT kTimeScale = 3;
@@ -82,8 +82,13 @@ Parameters::Type Parameters::Fill(Slot& slot, const base::Value& value, bool loo
 Parameters::Type Parameters::FillText(Slot& slot, const std::string& text) {
     slot.text = ToUtf16(text);
     slot.length = static_cast<SQLLEN>(slot.text.size() * sizeof(char16_t));
-    const SQLULEN size = slot.text.size() <= kTextLength ? kTextLength : kUnlimited;
-    return {SQL_C_WCHAR, SQL_WVARCHAR, size, 0, slot.text.data(), slot.length};
+    const bool is_long = slot.text.size() > kTextLength;
+    return {SQL_C_WCHAR,
+            static_cast<SQLSMALLINT>(is_long ? SQL_WLONGVARCHAR : SQL_WVARCHAR),
+            is_long ? slot.text.size() : kTextLength,
+            0,
+            slot.text.data(),
+            slot.length};
 }
 
 Parameters::Type Parameters::FillDigits(Slot& slot, std::string digits) {

@@ -79,9 +79,10 @@ void AppendInJson(BoundSql& out, std::string json, Dialect dialect, bool as_text
     }
     // Texts made of numbers take the collation of what they are compared with.
     out.text += as_text ? " in (select cast(value as nvarchar(20))" : " in (select value";
-    out.text += " from openjson(";
+    // Drivers send long texts as types that openjson does not take.
+    out.text += " from openjson(cast(";
     AppendValue(out, std::move(json));
-    out.text += ") with (value bigint '$'))";
+    out.text += " as nvarchar(max))) with (value bigint '$'))";
 }
 
 }  // namespace zebtell::erp::sql
