@@ -7,8 +7,7 @@
 
 namespace zebtell::check {
 
-// What the portal needs and the database does not have: tables, columns, and the foreign keys by
-// which links are followed.
+// The tables and columns that the portal needs and the database does not have.
 std::vector<Finding> MissingInDatabase(const erp::Schema& schema);
 
 }  // namespace zebtell::check

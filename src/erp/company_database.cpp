@@ -1,7 +1,7 @@
 #include "erp/company_database.h"
 
 #include "erp/sql/errors.h"
-#include "erp/view_links.h"
+#include "erp/links_by_name.h"
 
 namespace zebtell::erp {
 namespace {
@@ -14,7 +14,7 @@ CompanyDatabase::CompanyDatabase(std::unique_ptr<Backend> backend)
     : backend_(std::move(backend)), pool_(*backend_), results_(kResultBytes) {
     const Lease connection = pool_.Read();
     description_ = connection->Describe();
-    FindViewLinks(description_.tables);
+    AddLinksByName(description_.tables);
     schema_ = std::make_unique<Schema>(std::move(description_.tables));
     translator_ = std::make_unique<Translator>(*schema_, backend_->dialect());
 }

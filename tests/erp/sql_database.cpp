@@ -9,7 +9,7 @@
 #include <stdexcept>
 
 #include "erp/sqlite/backend.h"
-#include "erp/view_links.h"
+#include "erp/links_by_name.h"
 #include "tests/support/source_folder.h"
 
 namespace zebtell::erp {
@@ -94,7 +94,7 @@ TwoCompanies::TwoCompanies(std::string_view changes) {
     sqlite::SqliteBackend backend(path_, {.reading = std::chrono::milliseconds(500)});
     connection_ = backend.Connect(Access::kRead);
     std::vector<TableInfo> tables = connection_->Describe().tables;
-    FindViewLinks(tables);
+    AddLinksByName(tables);
     schema_ = std::make_unique<Schema>(std::move(tables));
 }
 
