@@ -30,6 +30,15 @@ bool GivesKeys(std::string_view table) {
     return kServerSchemaSql.find(begin) != std::string_view::npos;
 }
 
+bool HoldsTables(erp::Connection& connection, erp::Dialect dialect) {
+    const auto row = connection.Query(erp::MadeFor(dialect, [](erp::Dialect of) {
+        const char* tables =
+            of == erp::Dialect::kSqlServer ? "INFORMATION_SCHEMA.TABLES" : "sqlite_master";
+        return erp::BoundSql{"SELECT count(*) FROM " + std::string(tables), {}};
+    }));
+    return row->Next() && row->GetInteger(0) != 0;
+}
+
 }  // namespace
 
 // The rows of one table that wait for being written together.
@@ -96,7 +105,7 @@ class ConnectionStore::TableRows : public RowWriter {
 
 ConnectionStore::ConnectionStore(erp::Backend& backend)
     : dialect_(backend.dialect()), connection_(backend.Connect(erp::Access::kWrite)) {
-    if (!connection_->Describe().tables.empty()) {
+    if (HoldsTables(*connection_, dialect_)) {
         throw base::RuntimeError(
             base::errors::kInvalidCall,
             "The database is not empty: the demo company needs one of its own");

@@ -16,7 +16,7 @@ export const exceptions = [
 
 // The functions that SQL Server 2016 has and the portal's statements call.
 const functions = new Set(
-  `abs avg cast coalesce convert count_big dateadd datediff day getdate isnull left len lower ltrim
+  `abs avg cast coalesce convert count count_big dateadd datediff day getdate isnull left len lower ltrim
   max min month newid nullif openjson replace right round rtrim scope_identity substring sum
   sysdatetime upper year`.split(/\s+/));
 
