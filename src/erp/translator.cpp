@@ -34,6 +34,9 @@ std::string_view ConditionOf(std::string_view filter) {
 }
 
 sql::Path PathOf(std::string_view dotted) {
+    if (dotted.empty()) {
+        sql::Fail("The name of a field is missing");
+    }
     return {base::Split(dotted, '.')};
 }
 

@@ -25,7 +25,7 @@ UPDATE SYUser SET PasswordHash = 'another';
 UPDATE GDocument SET DocKey = 'another ' || ID;
 UPDATE GRCompanyPriceCat SET Name = 'b' WHERE ID = 2;
 UPDATE GRPriceList SET Name = 'b', Currency = 'USD' WHERE ID = 30;
-UPDATE GRPriceList SET Name = 'b' WHERE ID = 11;
+UPDATE GRPriceList SET Name = 'c' WHERE ID = 11;
 UPDATE EREmployee SET Name = 'b', Email = 'b' WHERE ID = 2;
 UPDATE GRCompany SET Code = 'B', Name = 'b', PriceCut = 5, IDEREmployee = 1 WHERE ID = 2;
 UPDATE GRCompContPerson SET Name = 'b' WHERE ID = 2;
