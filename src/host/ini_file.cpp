@@ -21,7 +21,7 @@ std::string_view TrimmedLine(std::string_view line) {
 std::vector<std::string> ReadLines(const std::filesystem::path& file) {
     std::ifstream in(file, std::ios::binary);
     std::string text(std::istreambuf_iterator<char>(in), {});
-    if (text.starts_with("\xEF\xBB\xBF")) text.erase(0, 3);
+    while (text.starts_with("\xEF\xBB\xBF")) text.erase(0, 3);
     text = base::Utf8FromEither(std::move(text));
     std::vector<std::string> lines;
     for (std::string_view line : base::Split(text, '\n')) {

@@ -1,10 +1,13 @@
 #include "host/server_settings.h"
 
+#include <algorithm>
+#include <cctype>
 #include <charconv>
 
 #include "base/runtime_error.h"
 #include "base/text.h"
 #include "host/ini_file.h"
+#include "http/target.h"
 
 namespace zebtell::host {
 namespace {
@@ -28,8 +31,14 @@ int WholeInt(const std::string& text, int from, int to) {
     return static_cast<int>(Whole(text, from, to));
 }
 
+// It stands in links and headers as it is, so nothing in it may mean anything there.
 std::string Path(const std::string& text) {
-    if (!text.starts_with('/')) Refuse("a path that begins with / is needed");
+    const bool is_plain = std::all_of(text.begin(), text.end(), [](unsigned char c) {
+        return std::isalnum(c) != 0 || c == '/' || c == '-' || c == '_' || c == '.' || c == '~';
+    });
+    if (!is_plain || !http::IsAcceptableTarget(text) || text.find("//") != std::string::npos) {
+        Refuse("a path such as /orders is needed");
+    }
     return text;
 }
 

@@ -193,6 +193,12 @@ std::size_t RequestParser::Impl::Take(std::string_view bytes) {
         bytes.remove_prefix(skipped);
         if (bytes.empty() || bytes == "\r") return skipped;
     }
+    // A body that is nothing but its last chunk: the library takes that in one piece only.
+    constexpr std::string_view kLastChunk = "0\r\n\r\n";
+    if (parser_->is_header_done() && parser_->chunked() && bytes.starts_with('0') &&
+        bytes.size() < kLastChunk.size()) {
+        return skipped;
+    }
     parser_->SetInput(bytes);
     error_code error;
     const std::size_t used = parser_->put({bytes.data(), bytes.size()}, error);

@@ -171,6 +171,8 @@ TEST_F(SettingsTest, ServerSectionRefusesNonsense) {
                             "Port=99999",
                             "SessionMinutes=0",
                             "BasePath=portal",
+                            "BasePath=//other.example",
+                            "BasePath=/a\">b",
                             "Threads=-1",
                             "TlsKey=key.pem"}) {
         folder.Write("ZEBTell.ini", "[Server]\n" + std::string(bad));
