@@ -5,6 +5,7 @@
 #include "app/pages.h"
 #include "catalogue/kaubainfo_tags.h"
 #include "catalogue/kinfo.h"
+#include "documents/recent_orders.h"
 #include "orders/kinnitus.h"
 #include "orders/koostamine.h"
 #include "orders/lisamine.h"
@@ -30,6 +31,7 @@ const std::vector<Words>& PageWords() {
         {"Kinnitus", orders::KinnitusTagTable, {"New", "ID_*", "COPY_*"}},
         {"Koostamine", orders::KoostamineTagTable, {"DEL_*"}},
         {"Lisamine", orders::LisamineTagTable, {"ID_*"}},
+        {"Raamistik", documents::RaamistikTagTable, {}},
         {"Tellimus", tags::OrderViewTagTable, {"ID_*"}},
     };
     return kWords;

@@ -3,6 +3,7 @@
 #include "account/kasutaja.h"
 #include "catalogue/kaubainfo.h"
 #include "catalogue/kinfo.h"
+#include "documents/recent_orders.h"
 #include "documents/tellimus.h"
 #include "host/logon.h"
 #include "host/plain_pages.h"
@@ -67,7 +68,7 @@ std::vector<host::Page> PortalPages() {
          {{"Logon", Logon_Logon, Work::kLogOn}}, kOpen},
         {"Logout", "zebtell_logout.htm", Logout_Respond, Shared_ProcessTag, nullptr,
          {{"Hyperlink2", Logout_Hyperlink2, Work::kQuick, Effect::kShows}}, kOpenAndChanges},
-        {"Raamistik", "zebtell_frame.htm", Raamistik_Respond, Shared_ProcessTag, nullptr, {}, kOpen},
+        {"Raamistik", "zebtell_frame.htm", Raamistik_Respond, Raamistik_ProcessTag, nullptr, {}, kOpen},
         {"Tellimus", "zebtell_tellimus.htm", Tellimus_Respond, Tellimus_ProcessTag, Tellimus_UserEvent, {}, kEventsShow},
         {"Vasak", "zebtell_vasak.htm", Vasak_Respond, Shared_ProcessTag, nullptr,
          {{"Body1", Vasak_Body1, Work::kQuick, Effect::kShows}}, kOpen},

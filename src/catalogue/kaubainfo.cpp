@@ -19,6 +19,12 @@ using host::SessionState;
 constexpr std::int32_t kFavouritesCategory = -1;
 constexpr std::string_view kReadingFailed = "Probleem andmete lugemisel, proovige uuesti!";
 
+// What became of a form is said once.
+void Show(SessionState& state, web::Call& call) {
+    host::ShowPage(state, call);
+    state.basket_form.LastForm = {};
+}
+
 // The three events that fill the list: an error leaves the list that was there and its order, with
 // a message.
 template <class Build>
@@ -35,7 +41,7 @@ void BuildAndShow(SessionState& state, web::Call& call, std::string_view handler
         catalogue.OrderText = order;
         RewindPage(catalogue);
     });
-    host::ShowPage(state, call);
+    Show(state, call);
 }
 
 std::string Posted(const web::Call& call, std::string_view field) {
@@ -115,7 +121,7 @@ void Turn(SessionState& state,
         if (!command.empty()) TurnPage(state.catalogue, command);
         RewindPage(state.catalogue);
     });
-    host::ShowPage(state, call);
+    Show(state, call);
 }
 
 }  // namespace
@@ -132,7 +138,9 @@ void Kaubainfo_Respond(SessionState& state, web::Call& call) {
         call.response.Clear();
         state.Message = message;
         call.RedirectTo("Kaubainfo", "Favorites");
+        return;
     }
+    state.basket_form.LastForm = {};
 }
 
 void Kaubainfo_ProcessTag(SessionState& state, web::Call& call, markup::Tag& tag) {

@@ -2,12 +2,14 @@
 
 #include "base/rounding.h"
 #include "base/text.h"
+#include "catalogue/basket_marks.h"
 #include "catalogue/option_lists.h"
 #include "catalogue/price_list.h"
 #include "catalogue/row_prices.h"
 #include "markup/escape.h"
 #include "tags/custom_func.h"
 #include "tags/field_text.h"
+#include "tags/refused_box.h"
 
 namespace zebtell::catalogue {
 namespace {
@@ -163,6 +165,36 @@ bool EditField(TagCall& c) {
     return true;
 }
 
+bool Korvis(TagCall& c) {
+    tags::ShowIf(c, QuantityInBasket(c.state) > 0);
+    return true;
+}
+
+bool KorvisKogus(TagCall& c) {
+    tags::WriteByPicture(c, QuantityInBasket(c.state));
+    return true;
+}
+
+bool LisaKogusRefused(TagCall& c) {
+    tags::ShowIfRefused(c, RowName(c, kQuantityBox));
+    return true;
+}
+
+bool QuickEntryRefused(TagCall& c) {
+    tags::ShowIfRefused(c, "QuickEntry");
+    return true;
+}
+
+bool Added(TagCall& c) {
+    tags::ShowIf(c, c.state.basket_form.LastForm.AddedRows > 0);
+    return true;
+}
+
+bool AddedCount(TagCall& c) {
+    tags::WriteByPicture(c, int{c.state.basket_form.LastForm.AddedRows});
+    return true;
+}
+
 bool LastFind(TagCall& c) {
     c.tag.WriteEscaped(Catalogue(c).LastFind);
     return true;
@@ -243,6 +275,17 @@ const tags::TagTable& KaubainfoTagTable() {
         {"ZEB:LisaLink", LisaLink, "address: the page that adds the row's article"},
         {"ZEB:InfoLink", InfoLink, "address: the page about the row's article"},
         {"ZEB:LisaKogus", WriteRowName<kQuantityBox>, "name of the row's quantity box"},
+        {"ZEB:LisaKogus.Refused",
+         LisaKogusRefused,
+         "contents, with what was typed in place of \"Typed\", when the row's box was refused"},
+        {"ZEB:Korvis", Korvis, "contents when the basket holds the row's article"},
+        {"ZEB:KorvisKogus", KorvisKogus, "how much of it, by a format picture"},
+        {"ZEB:QuickEntry.Refused",
+         QuickEntryRefused,
+         "contents, with the lines in place of \"Typed\", when lines of the quick entry were "
+         "refused"},
+        {"ZEB:Added", Added, "contents when the last form has added rows to the basket"},
+        {"ZEB:Added.Count", AddedCount, "how many, by a format picture"},
         {"ZEB:SavePriceTag", WriteRowName<kPriceBox>, "name of the row's price field"},
         {"ZEB:SaveUPriceTag", WriteRowName<kUnitPriceBox>, "name of the row's unit price field"},
         {"ZEB:MuudaKomment", MuudaKomment, "name of the basket row's comment box"},

@@ -71,6 +71,7 @@ void TurnPage(CatalogueState& catalogue, std::string_view command) {
 void RewindPage(CatalogueState& catalogue) {
     // The prices are those of the moment, also on a page that was shown before.
     catalogue.PricesFrom = catalogue.PricesTo = 0;
+    catalogue.BasketQuantities.reset();
     catalogue.RowCursor =
         base::ToInteger16(static_cast<double>(catalogue.PageNumber - 1) * catalogue.PageLength + 1);
 }

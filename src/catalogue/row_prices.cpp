@@ -45,6 +45,11 @@ std::string PriceField(const host::SessionState& state, std::string_view field) 
     if (base::EqualNoCase(field, "FinalPrice18")) {
         return FinalPrice18(prices, state.region());
     }
+    if (base::EqualNoCase(field, "FinalPriceWTax") && state.catalogue.CurrentRow) {
+        return tags::FixedPrice(prices.GetField("FinalPrice"),
+                                tags::TaxFactor(*state.catalogue.CurrentRow),
+                                state.region());
+    }
     return tags::FormatFieldValue(prices, field, "", state.region());
 }
 

@@ -10,7 +10,10 @@ namespace {
 
 constexpr std::string_view kBasketRowWords[] = {"#"};
 constexpr std::string_view kPriceLineWords[] = {"Price", "Price18", "FinalPrice*", "PriceCut*"};
-constexpr std::string_view kPriceWords[] = {"FinalPrice", "FinalPrice18", "PriceCut"};
+constexpr std::string_view kPriceWords[] = {
+    "FinalPrice", "FinalPrice18", "FinalPriceWTax", "PriceCut"};
+constexpr std::string_view kArticlePriceWords[] = {
+    "ID", "FinalPrice", "FinalPriceWTax", "PriceCut"};
 constexpr std::string_view kAddedWords[] = {"Price", "Price18", "PriceWTax"};
 constexpr std::string_view kComposedWords[] = {"Kustuta"};
 // Written as plain text for a text box.
@@ -53,6 +56,8 @@ constexpr TagContents kContents[] = {
     {"Kaubainfo", "zeb:grupp.*"},
     {"Kaubainfo", "zeb:infolink"},
     {"KInfo",       "zeb:grarticle",  "GRArticle"},
+    {"KInfo",       "zeb:qpricelist", "*", kArticlePriceWords},
+    {"Raamistik",   "zeb:sdorder",    "SDOrder"},
     {"Koostamine",  "zeb:orderrow",   "SDOrderRow", kComposedWords},
     {"Koostamine",  "zeb:sdorderrow", "SDOrderRow", kComposedWords},
     {"Koostamine",  "zeb:order",      "SDOrder",    kHeaderWords},

@@ -40,21 +40,26 @@ void AddTo(data::BasketValues& basket, RowsByArticle& rows, const WantedArticle&
     rows.emplace(wanted.article, basket.BasketRows->Item(basket.BasketRows->Count()));
 }
 
-void AddAll(SessionState& state,
-            const std::vector<WantedArticle>& all,
-            bool one_row_an_article,
-            Refusals& refusals) {
-    if (all.empty()) return;
+// The number of those that were added.
+std::int16_t AddAll(SessionState& state,
+                    const std::vector<WantedArticle>& all,
+                    bool one_row_an_article,
+                    Refusals& refusals) {
+    if (all.empty()) return 0;
     EnsureBasket(state);
     RowsByArticle rows = ReadRows(state.basket);
+    std::int16_t added = 0;
     for (const WantedArticle& wanted : all) {
         const auto add = [&] {
             if (!one_row_an_article) rows.clear();
             AddTo(state.basket, rows, wanted);
+            ++added;
         };
-        host::Guarded(
-            state, "Kaubainfo_Lisamine", add, [&] { refusals.Add(wanted.name, wanted.typed); });
+        host::Guarded(state, "Kaubainfo_Lisamine", add, [&] {
+            refusals.Add(wanted.name, wanted.typed, wanted.box);
+        });
     }
+    return added;
 }
 
 }  // namespace
@@ -65,7 +70,8 @@ void Kaubainfo_Lisamine(SessionState& state, web::Call& call) {
         if (RefusesOrders(state, call)) return;
         Refusals refusals;
         const auto wanted = ReadWantedArticles(state, call.request, refusals);
-        AddAll(state, wanted, tags::IsUniqueField(call.request, "ID"), refusals);
+        state.basket_form.LastForm.AddedRows =
+            AddAll(state, wanted, tags::IsUniqueField(call.request, "ID"), refusals);
         refusals.Tell(state);
     };
     host::Guarded(

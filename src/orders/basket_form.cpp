@@ -36,7 +36,7 @@ void ChangeRowQuantity(
     double quantity = 0;
     if (!tags::ParseQuantity(state, typed, quantity) || quantity < 0 || quantity > kMostQuantity) {
         const base::Value code = row.GetField("GRArticle.Code");
-        refusals.Add(code.IsBlank() ? "" : code.ToPlainText(), typed);
+        refusals.Add(code.IsBlank() ? "" : code.ToPlainText(), typed, box);
         return;
     }
     const std::string id = row.GetField("ID").ToPlainText();
@@ -115,6 +115,12 @@ void ChangeBasket(SessionState& state, const web::Call& call) {
     refusals.Tell(state);
 }
 
+// The basket's form may stand on the page of the basket, too.
+std::string_view PageOfForm(const web::Call& call) {
+    const bool own_page = base::EqualNoCase(call.request.Value("Next"), "Koostamine");
+    return own_page ? "Koostamine" : "Kaubainfo";
+}
+
 // Each button is looked at, also when one before it was pressed: the last one decides the page.
 void PressButtons(SessionState& state, web::Call& call) {
     if (!Posted(call, "Vormista").empty()) {
@@ -124,10 +130,10 @@ void PressButtons(SessionState& state, web::Call& call) {
     }
     if (!Posted(call, "Order_Clear").empty()) {
         data::DiscardBasket(state.basket);
-        call.NextItem("Kaubainfo");
+        call.NextItem(PageOfForm(call));
     }
     if (!Posted(call, "Change_Quant").empty()) {
-        call.NextItem("Kaubainfo");
+        call.NextItem(PageOfForm(call));
         ChangeBasket(state, call);
     }
 }
@@ -137,7 +143,7 @@ void PressButtons(SessionState& state, web::Call& call) {
 template <class Work>
 void OnCatalogue(SessionState& state, web::Call& call, std::string_view handler, Work&& work) {
     state.catalogue.ListFresh = true;
-    host::Guarded(state, handler, work, [&] { call.NextItem("Kaubainfo"); });
+    host::Guarded(state, handler, work, [&] { call.NextItem(PageOfForm(call)); });
 }
 
 }  // namespace

@@ -78,6 +78,7 @@ void Koostamine_Respond(SessionState& state, web::Call& call) {
     state.basket_form.BasketRowCursor = 1;
     state.basket_form.CurrentBasketRow.reset();
     host::ShowPage(state, call);
+    state.basket_form.LastForm = {};
 }
 
 void Koostamine_ProcessTag(SessionState& state, web::Call& call, markup::Tag& tag) {

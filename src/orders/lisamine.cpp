@@ -20,11 +20,6 @@ using tags::TagCall;
 
 constexpr std::string_view kFixed[] = {"Price"};
 
-double TaxFactor(data::Record& row) {
-    const base::Value percent = row.GetField("GRArticle.GRTax.TaxPercent");
-    return percent.IsBlank() ? 1 : 1 + percent.ToDouble() / 100;
-}
-
 bool LisaRida(TagCall& c) {
     data::Record* row = c.state.basket_form.RowToAdd.get();
     const std::string field = tags::Reference(c);
@@ -34,8 +29,9 @@ bool LisaRida(TagCall& c) {
         return true;
     }
     const auto settings = c.state.settings();
-    c.tag.Write(tags::FixedPrice(
-        row->GetField("Price"), with_own_tax ? TaxFactor(*row) : tags::kTax18, settings->region()));
+    c.tag.Write(tags::FixedPrice(row->GetField("Price"),
+                                 with_own_tax ? tags::TaxFactor(*row) : tags::kTax18,
+                                 settings->region()));
     return true;
 }
 

@@ -14,13 +14,19 @@ constexpr std::size_t kLongestTyped = 40;
 
 }  // namespace
 
-void Refusals::Add(std::string_view what, std::string_view typed) {
+void Refusals::Add(std::string_view what, std::string_view typed, std::string_view box) {
     std::string item(base::FirstCharacters(what, kLongestTyped));
     item.append(" \"").append(base::FirstCharacters(typed, kLongestTyped)).append("\"");
     items_.push_back(std::move(item));
+    if (box == kQuickEntryBox) {
+        boxes_[std::string(box)].append(what).append("\t").append(typed).append("\n");
+    } else if (!box.empty()) {
+        boxes_[std::string(box)] = typed;
+    }
 }
 
 void Refusals::Tell(host::SessionState& state) const {
+    state.basket_form.LastForm.Refused = boxes_;
     if (items_.empty()) return;
     std::string text(kRefused.In(state.settings()->language()));
     for (std::size_t i = 0; i < items_.size() && i < kMostNamed; ++i) {

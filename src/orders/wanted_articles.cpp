@@ -4,6 +4,7 @@
 #include <unordered_map>
 
 #include "base/text.h"
+#include "orders/quick_entry.h"
 #include "tags/custom_func.h"
 #include "tags/form_values.h"
 #include "tags/price_query.h"
@@ -52,7 +53,7 @@ bool TakeQuantity(SessionState& state, WantedArticle& wanted, Refusals& refusals
     if (wanted.typed.empty()) return false;
     const bool is_number = tags::ParseQuantity(state, wanted.typed, wanted.quantity);
     if (is_number && wanted.quantity > 0 && wanted.quantity <= kMostQuantity) return true;
-    if (!is_number || wanted.quantity != 0) refusals.Add(wanted.name, wanted.typed);
+    if (!is_number || wanted.quantity != 0) refusals.Add(wanted.name, wanted.typed, wanted.box);
     return false;
 }
 
@@ -65,6 +66,7 @@ std::vector<Wish> RowWishes(const web::Request& request) {
         wish.row_id = name.substr(3);
         wish.wanted.typed = tags::CleanFormValue(field.value);
         if (wish.wanted.typed.empty()) continue;
+        wish.wanted.box = name;
         wish.wanted.asked = {PostedPrice(request, "Price_" + wish.row_id),
                              PostedPrice(request, "UPrice_" + wish.row_id)};
         wishes.push_back(std::move(wish));
@@ -72,14 +74,24 @@ std::vector<Wish> RowWishes(const web::Request& request) {
     return wishes;
 }
 
+void AddCodeWish(std::vector<Wish>& wishes, std::string code, std::string quantity) {
+    if (code.empty()) return;
+    Wish& wish = wishes.emplace_back();
+    wish.wanted.name = std::move(code);
+    wish.wanted.typed = std::move(quantity);
+    wish.wanted.box = kQuickEntryBox;
+}
+
 std::vector<Wish> CodeWishes(const web::Request& request) {
     std::vector<Wish> wishes;
     for (std::int16_t n = 1; n < std::numeric_limits<std::int16_t>::max(); ++n) {
         if (!request.Form.Has("Code_f" + std::to_string(n))) break;
-        Wish wish;
-        wish.wanted.name = tags::ReadRowField(request, "Code", n);
-        wish.wanted.typed = tags::ReadRowField(request, "Quantity", n);
-        if (!wish.wanted.name.empty()) wishes.push_back(std::move(wish));
+        AddCodeWish(wishes,
+                    tags::ReadRowField(request, "Code", n),
+                    tags::ReadRowField(request, "Quantity", n));
+    }
+    for (QuickEntryLine& line : ReadQuickEntry(request.Form[kQuickEntryBox])) {
+        AddCodeWish(wishes, std::move(line.code), std::move(line.quantity));
     }
     return wishes;
 }
@@ -152,7 +164,7 @@ std::vector<WantedArticle> ReadWantedArticles(SessionState& state,
         for (Wish& wish : *wishes) {
             if (!TakeQuantity(state, wish.wanted, refusals)) continue;
             if (wish.wanted.article == 0) {
-                refusals.Add(wish.wanted.name, wish.wanted.typed);
+                refusals.Add(wish.wanted.name, wish.wanted.typed, wish.wanted.box);
             } else {
                 wanted.push_back(std::move(wish.wanted));
             }

@@ -104,6 +104,14 @@ bool RoundQuantity(TagCall& call) {
     return kHandled;
 }
 
+// So that a navigation that all pages share can mark the one that is shown.
+bool OnPage(TagCall& call) {
+    ShowIf(call,
+           base::EqualNoCase(call.NameFrom(std::string_view("ZEB:Page.").size()),
+                             call.call.PageName()));
+    return kHandled;
+}
+
 // Not handled in spite of its output, as templates know it; no later handler has this tag.
 bool Company(TagCall& call) {
     const auto& company = call.state.company;
@@ -138,6 +146,7 @@ const TagTable& CommonTagTable() {
         {"ZEB:SaveValue", SaveValue, "The posted value of the field named (save_...)"},
         {"ZEB:RoundQuantity", RoundQuantity, "Sets the decimals of typed quantities"},
         {"ZEB:Company", Company, "Field of the customer's company"},
+        {"ZEB:Page.*", OnPage, "Contents on the page named behind the dot"},
         {"*.Row", QueryRow, "Contents for each record of the query named"},
     };
     return table;

@@ -3,6 +3,7 @@
 #include "tags/field_text.h"
 #include "tags/orders_enable.h"
 #include "tags/page_tags.h"
+#include "tags/refused_box.h"
 #include "tags/row_loop.h"
 
 namespace zebtell::tags {
@@ -56,6 +57,10 @@ void TellimusRida(TagCall& call) {
 
 void MuudaKogus(TagCall& call) {
     call.tag.Write("Row_" + std::to_string(call.state.basket_form.RowIndex));
+}
+
+void MuudaKogusRefused(TagCall& call) {
+    ShowIfRefused(call, "Row_" + std::to_string(call.state.basket_form.RowIndex));
 }
 
 void ParentExists(TagCall& call) {
@@ -113,6 +118,9 @@ const TagTable& OrderSummaryTagTable() {
          Tolerant<TellimusRida, kPassedOn>,
          "Field of the basket row; # is its number"},
         {"ZEB:MuudaKogus", Tolerant<MuudaKogus, kPassedOn>, "Name of the row's quantity field"},
+        {"ZEB:MuudaKogus.Refused",
+         Tolerant<MuudaKogusRefused, kHandled>,
+         "Contents, with what was typed in place of \"Typed\", when that field was refused"},
         {"ZEB:Parent.Exists", Tolerant<ParentExists, kPassedOn>, "Contents with a parent company"},
         {"ZEB:Parent", Tolerant<Parent, kPassedOn>, "Field of the parent company"},
         {"ZEB:Contact.Exists",

@@ -2,6 +2,7 @@
 
 #include <cstdint>
 #include <memory>
+#include <optional>
 #include <string>
 #include <unordered_map>
 
@@ -19,6 +20,8 @@ struct CatalogueState {
     std::shared_ptr<data::RecordList> PriceQuery;
     std::int64_t PricesFrom = 0;
     std::int64_t PricesTo = 0;
+    // The basket's quantities by article; counted when the page's first row asks.
+    std::optional<std::unordered_map<std::int64_t, double>> BasketQuantities;
     std::int16_t RowCursor = 1;
     std::int16_t RowCount = 0;
     std::int16_t PageLength = 0;  // 0: no paging

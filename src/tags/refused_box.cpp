@@ -1,0 +1,16 @@
+#include "tags/refused_box.h"
+
+#include "base/text.h"
+#include "markup/escape.h"
+
+namespace zebtell::tags {
+
+void ShowIfRefused(TagCall& call, const std::string& box) {
+    const auto& refused = call.state.basket_form.LastForm.Refused;
+    const auto found = refused.find(box);
+    if (found == refused.end()) return call.tag.Hide();
+    call.tag.Write(
+        base::ReplacedNoCase(call.tag.TemplateContents(), "Typed", markup::Escaped(found->second)));
+}
+
+}  // namespace zebtell::tags
