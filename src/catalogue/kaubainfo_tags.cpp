@@ -7,9 +7,9 @@
 #include "catalogue/price_list.h"
 #include "catalogue/row_prices.h"
 #include "markup/escape.h"
+#include "tags/basket_boxes.h"
 #include "tags/custom_func.h"
 #include "tags/field_text.h"
-#include "tags/refused_box.h"
 
 namespace zebtell::catalogue {
 namespace {
@@ -152,12 +152,6 @@ bool InfoLink(TagCall& c) {
     return true;
 }
 
-bool MuudaKomment(TagCall& c) {
-    c.state.basket_form.ShowRowExplanations = true;
-    c.tag.Write("Expl_" + std::to_string(c.state.basket_form.RowIndex));
-    return true;
-}
-
 bool EditField(TagCall& c) {
     const std::string name(c.NameFrom(std::string_view("ZEB:EditField.").size()));
     c.state.basket_form.EditableRowFields.insert(name);
@@ -288,7 +282,7 @@ const tags::TagTable& KaubainfoTagTable() {
         {"ZEB:Added.Count", AddedCount, "how many, by a format picture"},
         {"ZEB:SavePriceTag", WriteRowName<kPriceBox>, "name of the row's price field"},
         {"ZEB:SaveUPriceTag", WriteRowName<kUnitPriceBox>, "name of the row's unit price field"},
-        {"ZEB:MuudaKomment", MuudaKomment, "name of the basket row's comment box"},
+        {"ZEB:MuudaKomment", tags::CommentBox, "name of the basket row's comment box"},
         {"ZEB:EditField.*", EditField, "name of a box for a further field of the basket row"},
         {"ZEB:LastFind", LastFind, "the last search text"},
         {"ZEB:Pagelen", Pagelen, "declares the rows per page; 0: no paging"},

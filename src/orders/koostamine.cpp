@@ -6,6 +6,7 @@
 #include "base/text.h"
 #include "host/errors.h"
 #include "orders/row_block.h"
+#include "tags/basket_boxes.h"
 #include "tags/field_text.h"
 #include "tags/page_tags.h"
 
@@ -122,6 +123,7 @@ const tags::TagTable& KoostamineTagTable() {
         {"ZEB:SDOrderRow", OrderRow, "the same as ZEB:OrderRow"},
         {"ZEB:Order", Order, "a field of the order"},
         {"ZEB:SDOrder", Order, "the same as ZEB:Order"},
+        {"ZEB:MuudaKomment", tags::CommentBox, "name of the basket row's comment box"},
     };
     return kTable;
 }

@@ -1,9 +1,9 @@
 #include "base/ignore_errors.h"
+#include "tags/basket_boxes.h"
 #include "tags/custom_func.h"
 #include "tags/field_text.h"
 #include "tags/orders_enable.h"
 #include "tags/page_tags.h"
-#include "tags/refused_box.h"
 #include "tags/row_loop.h"
 
 namespace zebtell::tags {
