@@ -64,6 +64,7 @@ constexpr TagContents kContents[] = {
     {"Koostamine",  "zeb:sdorder",    "SDOrder",    kHeaderWords},
     {"Lisamine",    "zeb:lisarida",   "GRPriceListRel", kAddedWords},
     {"Kinnitus",    "zeb:sdorder",    "SDOrder", kHeaderWords},
+    {"Kinnitus",    "zeb:recipient",  "SDOrder"},
     {"Kinnitus",    "zeb:sdorderrow", "SDOrderRow"},
     {"Kinnitatud",  "zeb:sdorder",    "SDOrder"},
     {"Kinnitatud",  "zeb:sdorderrow", "SDOrderRow"},

@@ -7,6 +7,7 @@
 #include "orders/header_fields.h"
 #include "orders/refusals.h"
 #include "orders/row_block.h"
+#include "tags/basket_boxes.h"
 #include "tags/field_text.h"
 #include "tags/order_view.h"
 #include "tags/page_tags.h"
@@ -37,6 +38,25 @@ bool Order(TagCall& c) {
         return true;
     }
     tags::WriteField(c, basket == nullptr ? nullptr : basket->Header().get(), kHeaderNumbers);
+    return true;
+}
+
+// A guest's name and address stand for a shop's, so he is shown only what he has typed himself.
+bool Recipient(TagCall& c) {
+    c.tag.Hide();
+    data::Document* basket = c.state.basket.Basket.get();
+    if (basket == nullptr) return true;
+    const auto& company = c.state.company.CompanyRecord;
+    const bool is_own = company && basket->GetField("CompanyName").ToPlainText() ==
+                                       company->GetField("Name").ToPlainText();
+    if (!c.state.logon.IsGuest || !is_own) {
+        tags::WritePlainField(c, *basket->Header(), tags::Reference(c));
+    }
+    return true;
+}
+
+bool Refused(TagCall& c) {
+    tags::ShowIfRefused(c, std::string(c.NameFrom(std::string_view("ZEB:Refused.").size())));
     return true;
 }
 
@@ -89,6 +109,7 @@ void Kinnitus_Respond(SessionState& state, web::Call& call) {
     state.basket_form.BasketRowCursor = 1;
     state.basket_form.CurrentBasketRow.reset();
     host::ShowPage(state, call);
+    state.basket_form.LastForm = {};
 }
 
 void Kinnitus_ProcessTag(SessionState& state, web::Call& call, markup::Tag& tag) {
@@ -133,6 +154,13 @@ const tags::TagTable& KinnitusTagTable() {
         {"ZEB:SDOrderRow", OrderRow, "a field of the row; prices and sums with two decimals"},
         {"ZEB:SDOrder", Order, "a field of the order; Explanation as plain text"},
         {"ZEB:MaksuRida", MaksuRida, "contents as they are"},
+        {"ZEB:Recipient",
+         Recipient,
+         "CompanyName or CompanyAddr of the order as plain text; of a guest's what he has typed"},
+        {"ZEB:Refused.*",
+         Refused,
+         "contents, with what was typed in place of \"Typed\", when the field behind the dot was "
+         "refused"},
     };
     return kTable;
 }

@@ -11,17 +11,23 @@ constexpr std::string_view kProblem = "Probleem tellimuse salvestamisel!";
 struct Reason {
     std::string_view description;
     host::LocalText text;
+    std::string_view field = {};
 };
 constexpr Reason kReasons[] = {
     {"The wanted date is over",
      {"Soovitud tarnepäev on möödas.",
       "The wanted delivery date is over.",
-      "Vēlamais piegādes datums ir pagājis."}},
-    {"CompanyName ", {"Nimi on liiga pikk.", "The name is too long.", "Nosaukums ir pārāk garš."}},
+      "Vēlamais piegādes datums ir pagājis."},
+     "SDOrder.WantedDate"},
+    {"CompanyName ",
+     {"Nimi on liiga pikk.", "The name is too long.", "Nosaukums ir pārāk garš."},
+     "SDOrder.CompanyName"},
     {"CompanyAddr ",
-     {"Aadress on liiga pikk.", "The address is too long.", "Adrese ir pārāk gara."}},
+     {"Aadress on liiga pikk.", "The address is too long.", "Adrese ir pārāk gara."},
+     "SDOrder.CompanyAddr"},
     {"Explanation ",
-     {"Märkused on liiga pikad.", "The comment is too long.", "Piezīmes ir pārāk garas."}},
+     {"Märkused on liiga pikad.", "The comment is too long.", "Piezīmes ir pārāk garas."},
+     "ZEB_Komment"},
     {"The order has no rows",
      {"Tellimusel ei ole ühtegi kogusega rida.",
       "The order has no rows with a quantity.",
@@ -42,14 +48,16 @@ constexpr Reason kReasons[] = {
 
 }  // namespace
 
-std::string SavingProblem(const std::exception& error, host::UserLanguage language) {
+SavingProblem DescribeSavingProblem(const std::exception& error, host::UserLanguage language) {
     const std::string_view description = error.what();
-    std::string text(kProblem);
+    SavingProblem problem{std::string(kProblem), {}};
     for (const Reason& reason : kReasons) {
         if (!description.starts_with(reason.description)) continue;
-        return text.append(" ").append(reason.text.In(language));
+        problem.message.append(" ").append(reason.text.In(language));
+        problem.field = reason.field;
+        break;
     }
-    return text;
+    return problem;
 }
 
 }  // namespace zebtell::orders

@@ -103,17 +103,19 @@ void PressButton(SessionState& state, web::Call& call) {
 }  // namespace
 
 void Kinnitus_LisaTellimus(SessionState& state, web::Call& call) {
-    std::string problem;
+    SavingProblem problem;
     const auto work = [&] {
         try {
             PressButton(state, call);
         } catch (const std::exception& error) {
-            problem = SavingProblem(error, state.settings()->language());
+            problem = DescribeSavingProblem(error, state.settings()->language());
             throw;
         }
     };
     host::Guarded(state, "Kinnitus_LisaTellimus", work, [&] {
-        state.Message = problem;
+        state.Message = problem.message;
+        const std::string field(problem.field);
+        if (!field.empty()) state.basket_form.LastForm.Refused[field] = Posted(call, field);
         call.RedirectTo("Kinnitus");
     });
 }

@@ -125,7 +125,7 @@ TEST(SavingProblem, SaysWhatTheUserCanDoSomethingAbout) {
         {"", Language::kEstonian, ""},
     };
     for (const Case& c : cases) {
-        EXPECT_EQ(SavingProblem(std::runtime_error(c.description), c.language),
+        EXPECT_EQ(DescribeSavingProblem(std::runtime_error(c.description), c.language).message,
                   std::string(kFailed) + c.more)
             << c.description;
     }
