@@ -50,7 +50,7 @@ bool Recipient(TagCall& c) {
     const bool is_own = company && basket->GetField("CompanyName").ToPlainText() ==
                                        company->GetField("Name").ToPlainText();
     if (!c.state.logon.IsGuest || !is_own) {
-        tags::WritePlainField(c, *basket->Header(), tags::Reference(c));
+        tags::WriteReference(c, basket->Header().get(), tags::Reference(c));
     }
     return true;
 }
@@ -156,7 +156,7 @@ const tags::TagTable& KinnitusTagTable() {
         {"ZEB:MaksuRida", MaksuRida, "contents as they are"},
         {"ZEB:Recipient",
          Recipient,
-         "CompanyName or CompanyAddr of the order as plain text; of a guest's what he has typed"},
+         "CompanyName or CompanyAddr of the order; of a guest's only what he has typed"},
         {"ZEB:Refused.*",
          Refused,
          "contents, with what was typed in place of \"Typed\", when the field behind the dot was "

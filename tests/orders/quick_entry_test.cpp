@@ -22,7 +22,7 @@ TEST(QuickEntry, LinesAsPeopleAndSpreadsheetsWriteThem) {
          "A-1\xC2\xA0"
          "2",
          "[A-1|2]"},
-        {"a quantity without a code", "\t5", "[5|1]"},
+        {"a quantity without a code", "\t5", "[|5]"},
         {"nothing", "", ""},
     };
     for (const Case& c : cases) {
