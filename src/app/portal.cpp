@@ -3,6 +3,7 @@
 #include <iostream>
 
 #include "app/pages.h"
+#include "app/process.h"
 #include "app/status.h"
 #include "host/web_class.h"
 #include "http/server.h"
@@ -27,6 +28,10 @@ http::ServerOptions OptionsOf(const host::ServerSettings& settings) {
     options.address = settings.Address;
     options.port = static_cast<std::uint16_t>(settings.Port);
     options.io_threads = static_cast<unsigned>(settings.Threads);
+    options.limits.connections =
+        MakeRoomForConnections(static_cast<std::size_t>(settings.MaxConnections));
+    options.limits.connections_per_address =
+        static_cast<std::size_t>(settings.MaxConnectionsPerAddress);
     options.limits.body_bytes = static_cast<std::size_t>(settings.MaxBodyBytes);
     options.certificate_file = settings.TlsCertificate;
     options.key_file = settings.TlsKey;
@@ -107,6 +112,9 @@ Portal::~Portal() = default;
 
 std::uint16_t Portal::port() const {
     return parts_->server.port();
+}
+void Portal::ReloadCertificate() {
+    parts_->server.ReloadCertificate();
 }
 erp::Databases& Portal::databases() {
     return parts_->databases;

@@ -24,6 +24,8 @@ class Portal {
     Portal& operator=(const Portal&) = delete;
 
     std::uint16_t port() const;
+    // RuntimeError when the new one can't be used; the portal then goes on with the old one.
+    void ReloadCertificate();
     erp::Databases& databases();
 
   private:

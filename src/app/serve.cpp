@@ -1,18 +1,42 @@
+#include <unistd.h>
+
 #include <csignal>
 #include <iostream>
 
 #include "app/commands.h"
 #include "app/portal.h"
+#include "app/process.h"
+#include "base/runtime_error.h"
 
 namespace zebtell::app {
 namespace {
 
-sigset_t StopSignals() {
+// A terminal that is closed ends a portal that was tried out in it; for a service, the signal asks
+// to read the certificate anew.
+sigset_t AwaitedSignals(bool has_certificate) {
     sigset_t signals;
     sigemptyset(&signals);
-    sigaddset(&signals, SIGTERM);
-    sigaddset(&signals, SIGINT);
+    for (const int signal : {SIGTERM, SIGINT}) sigaddset(&signals, signal);
+    if (has_certificate || isatty(STDIN_FILENO) == 0) sigaddset(&signals, SIGHUP);
     return signals;
+}
+
+void ReloadCertificate(Portal& portal) {
+    try {
+        portal.ReloadCertificate();
+        std::cout << "ZEBTell has read its certificate anew" << std::endl;
+    } catch (const base::RuntimeError& error) {
+        std::cerr << "zebtell: the certificate stays the old one: " << error.description()
+                  << std::endl;
+    }
+}
+
+// Until the program is told to stop.
+void AwaitStop(const sigset_t& signals, Portal& portal) {
+    for (int signal = 0; sigwait(&signals, &signal) == 0;) {
+        if (signal != SIGHUP) return;
+        ReloadCertificate(portal);
+    }
 }
 
 }  // namespace
@@ -26,14 +50,14 @@ int Serve(const std::filesystem::path& folder,
     override(settings);
 
     // Blocked before any thread is there, so that only the wait below gets them.
-    const sigset_t signals = StopSignals();
+    const sigset_t signals = AwaitedSignals(!settings.TlsKey.empty());
     pthread_sigmask(SIG_BLOCK, &signals, nullptr);
 
-    const Portal portal(here, settings);
+    if (IsRoot()) std::cerr << "zebtell: runs as root, and needs no such rights" << std::endl;
+    Portal portal(here, settings);
     std::cout << "ZEBTell serves " << (settings.TlsKey.empty() ? "http" : "https") << "://"
               << settings.Address << ":" << portal.port() << settings.BasePath << std::endl;
-    int signal = 0;
-    sigwait(&signals, &signal);
+    AwaitStop(signals, portal);
     std::cout << "ZEBTell stops" << std::endl;
     return 0;
 }

@@ -70,6 +70,14 @@ constexpr ServerSettingsRow kRows[] = {
     {"MaxBodyBytes",
      [](ServerSettings& s, const std::string& v) { s.MaxBodyBytes = Whole(v, 1024, 1 << 30); },
      "largest form in bytes (1048576)"},
+    {"MaxConnections",
+     [](ServerSettings& s, const std::string& v) { s.MaxConnections = WholeInt(v, 1, 1000000); },
+     "connections open at the most (20000)"},
+    {"MaxConnectionsPerAddress",
+     [](ServerSettings& s, const std::string& v) {
+         s.MaxConnectionsPerAddress = WholeInt(v, 0, 1000000);
+     },
+     "of them from one address (12000); 0: no limit"},
     {"TlsCertificate",
      [](ServerSettings& s, const std::string& v) { s.TlsCertificate = v; },
      "PEM file of the certificate chain; with TlsKey the portal serves https"},

@@ -19,7 +19,9 @@ struct ServerSettings {
     int SessionMinutes = 20;
     int MaxSessions = 10000;
     std::int64_t MaxBodyBytes = 1 << 20;
-    std::string TlsCertificate;  // PEM files; both or none
+    int MaxConnections = 20'000;
+    int MaxConnectionsPerAddress = 12'000;  // 0: no limit; trusted proxies have none
+    std::string TlsCertificate;             // PEM files; both or none
     std::string TlsKey;
     std::vector<std::string> TrustedProxies;  // addresses or networks, "10.0.0.0/8"
     std::filesystem::path TemplateFolder;     // empty: the component's folder

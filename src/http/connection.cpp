@@ -24,12 +24,17 @@ constexpr std::string_view kContinue = "HTTP/1.1 100 Continue\r\n\r\n";
 template <class Stream>
 class StreamConnection final : public Connection {
   public:
-    StreamConnection(std::shared_ptr<Worker> worker, std::string peer, Stream stream)
+    StreamConnection(std::shared_ptr<Worker> worker,
+                     std::string peer,
+                     std::shared_ptr<asio::ssl::context> tls,
+                     Stream stream)
         : worker_(std::move(worker)),
           options_(worker_->context().options),
           peer_(std::move(peer)),
+          tls_(std::move(tls)),
           stream_(std::move(stream)),
-          parser_(options_.limits) {}
+          parser_(options_.limits),
+          share_(worker_->context().bodies) {}
 
     void Start() override;
     void Respond(Response response) override;
@@ -80,9 +85,11 @@ class StreamConnection final : public Connection {
     const std::shared_ptr<Worker> worker_;
     const ServerOptions& options_;
     const std::string peer_;
+    const std::shared_ptr<asio::ssl::context> tls_;  // the server may have a newer one by now
     Stream stream_;
     ReadBuffer in_;
     RequestParser parser_;
+    BodyBudget::Share share_;
     Phase phase_ = Phase::kOpening;
     bool is_reading_ = false;
     bool has_continued_ = false;
@@ -96,7 +103,10 @@ class StreamConnection final : public Connection {
 template <class Stream>
 void StreamConnection<Stream>::Enter(Phase phase, Timeouts::Duration timeout) {
     phase_ = phase;
-    deadline_ = Worker::Clock::now() + timeout;
+    const auto now = Worker::Clock::now();
+    const auto crowded =
+        phase == Phase::kIdle ? std::min(timeout, options_.timeouts.crowded_idle) : timeout;
+    SetDeadlines(now + timeout, now + crowded);
 }
 
 template <class Stream>
@@ -133,7 +143,9 @@ template <class Stream>
 void StreamConnection<Stream>::ReadMore() {
     EnterReading();
     if (phase_ == Phase::kClosed) return;
-    const auto space = in_.Space(phase_ == Phase::kBody ? kBodyReadSize : 1);
+    // Large pieces for those who have sent some already; announcing a large body takes no memory.
+    const bool is_large = phase_ == Phase::kBody && parser_.body_size() >= kBodyReadSize / 2;
+    const auto space = in_.Space(is_large ? kBodyReadSize : 1);
     is_reading_ = true;
     stream_.async_read_some(asio::buffer(space.data(), space.size()),
                             [self = Self()](const error_code& error, std::size_t count) {
@@ -155,6 +167,7 @@ void StreamConnection<Stream>::OnRead(const error_code& error, std::size_t count
 template <class Stream>
 void StreamConnection<Stream>::ProcessInput() {
     if (!in_.Data().empty()) in_.Consume(parser_.Take(in_.Data()));
+    if (!share_.Resize(in_.Capacity() + parser_.body_size())) return Refuse(503);
     switch (parser_.state()) {
         case RequestParser::State::kDone:
             return Handle();
@@ -183,7 +196,7 @@ void StreamConnection<Stream>::SendContinue() {
 template <class Stream>
 void StreamConnection<Stream>::Handle() {
     phase_ = Phase::kHandling;
-    deadline_ = Worker::Clock::time_point::max();
+    SetDeadlines(Worker::Clock::time_point::max(), Worker::Clock::time_point::max());
     const bool keeps = ++requests_ < options_.limits.requests_per_connection &&
                        parser_.keep_alive() && !worker_->stopping();
     sending_.after = !keeps                ? After::kClose
@@ -246,8 +259,9 @@ void StreamConnection<Stream>::OnWritten(const error_code& error) {
     if (phase_ == Phase::kClosed) return;
     if (error) return Close();
     response_ = {};
-    if (sending_.after == After::kClose) return Linger();
     parser_.Reset();
+    share_.Resize(0);
+    if (sending_.after == After::kClose) return Linger();
     has_continued_ = false;
     ProcessInput();
 }
@@ -275,7 +289,8 @@ void StreamConnection<Stream>::EndSending() {
 template <class Stream>
 void StreamConnection<Stream>::Drain() {
     in_.Clear();
-    const auto space = in_.Space(kBodyReadSize);
+    in_.ShrinkWhenEmpty();
+    const auto space = in_.Space(1);
     is_reading_ = true;
     socket().async_read_some(asio::buffer(space.data(), space.size()),
                              [self = Self()](const error_code& error, std::size_t count) {
@@ -311,13 +326,14 @@ void StreamConnection<Stream>::Close() {
 std::shared_ptr<Connection> MakeConnection(std::shared_ptr<Worker> worker,
                                            Socket socket,
                                            std::string peer,
-                                           asio::ssl::context* tls) {
+                                           std::shared_ptr<asio::ssl::context> tls) {
     if (tls == nullptr) {
         return std::make_shared<StreamConnection<Socket>>(
-            std::move(worker), std::move(peer), std::move(socket));
+            std::move(worker), std::move(peer), nullptr, std::move(socket));
     }
+    TlsStream stream(std::move(socket), *tls);
     return std::make_shared<StreamConnection<TlsStream>>(
-        std::move(worker), std::move(peer), TlsStream(std::move(socket), *tls));
+        std::move(worker), std::move(peer), std::move(tls), std::move(stream));
 }
 
 }  // namespace zebtell::http

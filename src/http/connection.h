@@ -27,17 +27,26 @@ class Connection : public std::enable_shared_from_this<Connection> {
     virtual void CloseWhenIdle() = 0;
     virtual void Close() = 0;
 
-    bool IsOverdue(Worker::Clock::time_point now) const { return now >= deadline_; }
+    bool IsOverdue(Worker::Clock::time_point now, bool is_crowded) const {
+        return now >= (is_crowded ? crowded_deadline_ : deadline_);
+    }
 
   protected:
+    void SetDeadlines(Worker::Clock::time_point usual, Worker::Clock::time_point crowded) {
+        deadline_ = usual;
+        crowded_deadline_ = crowded;
+    }
+
+  private:
     Worker::Clock::time_point deadline_ = Worker::Clock::time_point::max();
+    Worker::Clock::time_point crowded_deadline_ = Worker::Clock::time_point::max();
 };
 
 // Takes over a socket that was counted in under `peer`; it is counted out when it is closed.
-// `tls` may be null and must outlive the connection's last use.
+// `tls` may be null.
 std::shared_ptr<Connection> MakeConnection(std::shared_ptr<Worker> worker,
                                            Socket socket,
                                            std::string peer,
-                                           asio::ssl::context* tls);
+                                           std::shared_ptr<asio::ssl::context> tls);
 
 }  // namespace zebtell::http

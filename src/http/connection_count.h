@@ -29,8 +29,13 @@ class ConnectionCount {
         --total_;
     }
 
+    std::size_t Total() const {
+        const std::lock_guard lock(mutex_);
+        return total_;
+    }
+
   private:
-    std::mutex mutex_;
+    mutable std::mutex mutex_;
     std::size_t total_ = 0;
     std::unordered_map<std::string, std::size_t> by_peer_;
 };

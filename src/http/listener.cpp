@@ -43,10 +43,11 @@ std::string PeerAddress(const Socket& socket) {
 
 }  // namespace
 
-Listener::Listener(std::vector<std::shared_ptr<Worker>> workers, asio::ssl::context* tls)
+Listener::Listener(std::vector<std::shared_ptr<Worker>> workers,
+                   std::shared_ptr<asio::ssl::context> tls)
     : workers_(std::move(workers)),
       context_(workers_.front()->context()),
-      tls_(tls),
+      tls_(std::move(tls)),
       acceptor_(workers_.front()->io()),
       pause_(workers_.front()->io()) {
     const auto endpoint = Resolve(workers_.front()->io(), context_.options);
@@ -63,6 +64,11 @@ Listener::Listener(std::vector<std::shared_ptr<Worker>> workers, asio::ssl::cont
 
 void Listener::Start() {
     asio::post(acceptor_.get_executor(), [this] { Accept(); });
+}
+
+void Listener::UseTls(std::shared_ptr<asio::ssl::context> tls) {
+    asio::post(acceptor_.get_executor(),
+               [this, tls = std::move(tls)]() mutable { tls_ = std::move(tls); });
 }
 
 void Listener::Stop() {

@@ -15,9 +15,10 @@ namespace zebtell::http {
 class Listener {
   public:
     // Binds at once: RuntimeError when the address can't be had. `tls` may be null.
-    Listener(std::vector<std::shared_ptr<Worker>> workers, asio::ssl::context* tls);
+    Listener(std::vector<std::shared_ptr<Worker>> workers, std::shared_ptr<asio::ssl::context> tls);
 
     void Start();
+    void UseTls(std::shared_ptr<asio::ssl::context> tls);  // any thread; for new connections
     void Stop();  // any thread; returns when no further connection is passed to a worker
 
     std::uint16_t port() const { return port_; }
@@ -29,7 +30,7 @@ class Listener {
 
     const std::vector<std::shared_ptr<Worker>> workers_;
     ServerContext& context_;
-    asio::ssl::context* const tls_;
+    std::shared_ptr<asio::ssl::context> tls_;  // only on the acceptor's thread
     Acceptor acceptor_;
     asio::steady_timer pause_;
     std::uint16_t port_ = 0;

@@ -17,6 +17,7 @@ class ReadBuffer {
     std::span<char> Space(std::size_t wanted);
     void Commit(std::size_t count) { end_ += count; }
 
+    std::size_t Capacity() const { return bytes_.size(); }
     void Clear() { begin_ = end_ = 0; }
     // An idle connection keeps no more than this.
     void ShrinkWhenEmpty();

@@ -250,6 +250,9 @@ int RequestParser::refusal() const {
 bool RequestParser::has_begun() const {
     return impl_->parser().got_some();
 }
+std::size_t RequestParser::body_size() const {
+    return impl_->parser().request.body.size();
+}
 bool RequestParser::keep_alive() const {
     return impl_->parser().keep_alive();
 }

@@ -26,8 +26,9 @@ class RequestParser {
     std::size_t Take(std::string_view bytes);
 
     State state() const;
-    int refusal() const;     // the status to answer when the state is kRefused
-    bool has_begun() const;  // a byte of the current request has come
+    int refusal() const;            // the status to answer when the state is kRefused
+    bool has_begun() const;         // a byte of the current request has come
+    std::size_t body_size() const;  // what has come of the body
 
     // From kBody on:
     bool keep_alive() const;  // what the client wishes

@@ -49,6 +49,10 @@ class Server {
     // nothing.
     void Stop();
 
+    // Reads the certificate and its key anew, for connections from now on. RuntimeError when they
+    // can't be used: the old ones stay. Does nothing without TLS.
+    void ReloadCertificate();
+
     std::uint16_t port() const;  // after Start
 
   private:

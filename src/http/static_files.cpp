@@ -7,6 +7,7 @@
 #include <utility>
 
 #include "base/text.h"
+#include "http/content_coding.h"
 #include "http/http_date.h"
 #include "http/response_head.h"
 #include "http/url.h"
@@ -91,6 +92,22 @@ std::optional<std::string> ReadFile(const fs::path& path) {
     return bytes;
 }
 
+bool IsText(std::string_view content_type) {
+    return content_type.starts_with("text/") || content_type == "image/svg+xml";
+}
+
+// "" when that is not shorter.
+std::string Packed(const std::string& bytes, Coding coding) {
+    std::string packed = Encoded(bytes, coding, Effort::kBest);
+    return packed.size() < bytes.size() ? packed : std::string();
+}
+
+// Of the same file in another coding: another sequence of bytes, so another tag.
+std::string TagIn(const std::string& etag, Coding coding) {
+    if (coding == Coding::kIdentity) return etag;
+    return etag.substr(0, etag.size() - 1) + "-" + std::string(CodingName(coding)) + "\"";
+}
+
 bool HasTag(std::string_view list, std::string_view etag) {
     for (std::string_view tag : base::Split(list, ',')) {
         tag = base::Trimmed(tag);
@@ -154,6 +171,10 @@ StaticFiles::FilePointer StaticFiles::Load(const std::string& name,
     file->bytes = std::move(*bytes);
     file->content_type = ContentType(name);
     file->etag = ETag(file->bytes);
+    if (IsText(file->content_type) && file->bytes.size() >= kLeastWorthCoding) {
+        file->gzip = Packed(file->bytes, Coding::kGzip);
+        file->brotli = Packed(file->bytes, Coding::kBrotli);
+    }
     file->modified = std::chrono::system_clock::to_time_t(
         std::chrono::file_clock::to_sys(std::chrono::time_point_cast<std::chrono::seconds>(stamp)));
     file->path = std::move(*path);
@@ -162,20 +183,25 @@ StaticFiles::FilePointer StaticFiles::Load(const std::string& name,
 }
 
 Response StaticFiles::Answer(const Request& request, const FilePointer& file) {
+    Coding coding = BestCoding(request.HeaderValue("Accept-Encoding"));
+    if (file->BytesIn(coding).empty()) coding = Coding::kIdentity;
+    const std::string etag = TagIn(file->etag, coding);
     Response response;
     response.headers = {{"Cache-Control", "public, max-age=3600"},
-                        {"ETag", file->etag},
+                        {"ETag", etag},
                         {"Last-Modified", FormatHttpDate(file->modified)}};
+    if (!file->gzip.empty()) response.headers.emplace_back("Vary", "Accept-Encoding");
     const std::string_view tags = request.HeaderValue("If-None-Match");
     const auto since = ParseHttpDate(request.HeaderValue("If-Modified-Since"));
-    const bool is_known =
-        tags.empty() ? since && file->modified <= *since : HasTag(tags, file->etag);
+    const bool is_known = tags.empty() ? since && file->modified <= *since : HasTag(tags, etag);
     if (is_known) {
         response.status = 304;
         return response;
     }
     response.headers.emplace_back("Content-Type", file->content_type);
-    response.shared_body = std::shared_ptr<const std::string>(file, &file->bytes);
+    if (coding != Coding::kIdentity)
+        response.headers.emplace_back("Content-Encoding", CodingName(coding));
+    response.shared_body = std::shared_ptr<const std::string>(file, &file->BytesIn(coding));
     return response;
 }
 

@@ -11,6 +11,7 @@
 #include <unordered_map>
 #include <vector>
 
+#include "http/content_coding.h"
 #include "http/message.h"
 
 namespace zebtell::http {
@@ -35,11 +36,17 @@ class StaticFiles {
 
     struct File {
         std::string bytes;
+        std::string gzip;  // packed once; "": not worth it
+        std::string brotli;
         std::string_view content_type;
         std::string etag;
         std::time_t modified = 0;
         std::filesystem::path path;
         std::filesystem::file_time_type stamp;
+
+        const std::string& BytesIn(Coding coding) const {
+            return coding == Coding::kGzip ? gzip : coding == Coding::kBrotli ? brotli : bytes;
+        }
     };
     using FilePointer = std::shared_ptr<const File>;
     struct Entry {

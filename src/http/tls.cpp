@@ -14,9 +14,9 @@ void Check(const boost::system::error_code& error, const std::string& what) {
 
 }  // namespace
 
-std::unique_ptr<Context> MakeTlsContext(const std::string& certificate_file,
+std::shared_ptr<Context> MakeTlsContext(const std::string& certificate_file,
                                         const std::string& key_file) {
-    auto context = std::make_unique<Context>(Context::tls_server);
+    auto context = std::make_shared<Context>(Context::tls_server);
     SSL_CTX* const native = context->native_handle();
     SSL_CTX_set_min_proto_version(native, TLS1_2_VERSION);
     SSL_CTX_set_options(native,

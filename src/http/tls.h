@@ -7,7 +7,7 @@
 namespace zebtell::http {
 
 // TLS 1.2 and later with forward secrecy only. RuntimeError for files that can't be used.
-std::unique_ptr<boost::asio::ssl::context> MakeTlsContext(const std::string& certificate_file,
+std::shared_ptr<boost::asio::ssl::context> MakeTlsContext(const std::string& certificate_file,
                                                           const std::string& key_file);
 
 }  // namespace zebtell::http

@@ -65,10 +65,11 @@ void Worker::Sweep() {
     if (!work_.owns_work()) return;
     const auto now = Clock::now();
     const bool is_over = stopping_ && now >= stop_deadline_;
+    const bool is_crowded = context_->IsCrowded();
     // They leave the set while they are being looked after.
     std::vector<std::shared_ptr<Connection>> overdue;
     for (const auto& connection : connections_) {
-        if (is_over || connection->IsOverdue(now)) overdue.push_back(connection);
+        if (is_over || connection->IsOverdue(now, is_crowded)) overdue.push_back(connection);
     }
     ScheduleSweep(stopping_ ? kStopSweep : sweep_interval_);
     for (const auto& connection : overdue) {

@@ -9,6 +9,7 @@
 #include <unordered_set>
 
 #include "http/asio_types.h"
+#include "http/body_budget.h"
 #include "http/client_address.h"
 #include "http/connection_count.h"
 #include "http/response_head.h"
@@ -21,12 +22,19 @@ class Connection;
 // What the connections of a server share.
 struct ServerContext {
     ServerContext(ServerOptions o, Handler h)
-        : options(std::move(o)), handler(std::move(h)), proxies(options.trusted_proxies) {}
+        : options(std::move(o)),
+          handler(std::move(h)),
+          proxies(options.trusted_proxies),
+          bodies(options.limits.body_bytes_in_all) {}
 
     const ServerOptions options;
     const Handler handler;
     const TrustedProxies proxies;
     ConnectionCount connections;
+    BodyBudget bodies;
+
+    // Three quarters of the places for connections are taken: those that only wait give way.
+    bool IsCrowded() const { return connections.Total() > options.limits.connections / 4 * 3; }
 
     void Log(std::string_view text) const {
         if (options.log) options.log(text);

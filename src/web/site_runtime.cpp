@@ -5,6 +5,7 @@
 #include <variant>
 
 #include "base/runtime_error.h"
+#include "http/content_coding.h"
 #include "web/cross_site.h"
 #include "web/plain_page.h"
 #include "web/request_reader.h"
@@ -27,6 +28,14 @@ bool Changes(const Request& request, const SitePage* page) {
            (page != nullptr && page->EffectOf(request.event) == Effect::kChanges);
 }
 
+void Pack(http::Response& response, http::Coding coding) {
+    if (response.body.size() < http::kLeastWorthCoding) return;
+    response.headers.emplace_back("Vary", "Accept-Encoding");
+    if (coding == http::Coding::kIdentity) return;
+    response.body = http::Encoded(response.body, coding, http::Effort::kQuick);
+    response.headers.emplace_back("Content-Encoding", http::CodingName(coding));
+}
+
 }  // namespace
 
 // A page request on its way through its session's queue.
@@ -36,6 +45,7 @@ struct SiteRuntime::Job {
     std::shared_ptr<Session> session;
     std::string new_token;  // to be sent as a cookie; "": the browser has it
     bool secure = false;
+    http::Coding coding = http::Coding::kIdentity;
     std::shared_ptr<void> place;  // among the log-ons, where it is one
 };
 
@@ -77,6 +87,10 @@ void SiteRuntime::Handle(const http::Request& request, http::Responder respond) 
     job->request = std::move(page_request);
     job->respond = std::move(respond);
     job->secure = request.secure;
+    // What another site asked for in the customer's name is sent as it is: its packed length would
+    // tell that site how much of what it chose stands in the page.
+    if (!IsCrossSite(request))
+        job->coding = http::BestCoding(request.HeaderValue("Accept-Encoding"));
     const Work work = WorkOf(job->request);
     if (work == Work::kLogOn) {
         job->place = TakePlace();
@@ -117,6 +131,7 @@ void SiteRuntime::Run(Job& job) {
     http::Response response;
     try {
         response = RunPage(job);
+        Pack(response, job.coding);
     } catch (const std::exception& error) {
         // The pages' own errors have ended within the cycle.
         if (options_.log) options_.log(error.what());

@@ -169,6 +169,48 @@ TEST(Limits, CountConnections) {
     ExpectCap(std::move(per_address), 2);
 }
 
+// Announced bodies cost nothing, those that have come count until they are answered, and a small
+// form has room whatever others hold.
+TEST(Limits, AddUpLargeBodiesOfAllConnections) {
+    Held held;
+    ServerOptions options = TwoThreads();
+    options.limits.body_bytes_in_all = std::size_t{300} * 1024;
+    TestServer test(held.handler(), std::move(options));
+    const std::string large = Post("/", std::string(200'000, 'x'));
+    RawClient silent = test.Connect();
+    silent.Send(large.substr(0, 100));
+    RawClient first = test.Connect();
+    first.Send(large);
+    const Responder respond = held.Take();
+    EXPECT_EQ(test.Connect().Ask(large).status, 503);
+    RawClient small = test.Connect();
+    small.Send(Post("/", std::string(8000, 'x')));
+    held.Take()({});
+    EXPECT_EQ(small.Read().status, 200);
+    respond({});
+    EXPECT_EQ(first.Read().status, 200);
+    silent.Send(large.substr(100));
+    held.Take()({});
+    EXPECT_EQ(silent.Read().status, 200) << "there is room again";
+}
+
+TEST(Limits, IdleConnectionsGiveWayWhenPlacesRunOut) {
+    ServerOptions options = TwoThreads();
+    options.limits.connections = 4;
+    options.timeouts.crowded_idle = kShort;
+    TestServer test(Echo, std::move(options));
+    std::vector<std::unique_ptr<RawClient>> clients;
+    for (int i = 0; i < 3; ++i) {
+        clients.push_back(std::make_unique<RawClient>(test.server.port()));
+        ASSERT_EQ(clients.back()->Ask(Get("/")).status, 200);
+    }
+    clients.front()->set_time_limit(3 * kShort);
+    EXPECT_THROW(clients.front()->IsClosed(), std::runtime_error) << "three of four may stay";
+    RawClient fourth = test.Connect();
+    EXPECT_EQ(fourth.Ask(Get("/")).status, 200);
+    EXPECT_TRUE(clients.front()->IsClosed());
+}
+
 TEST(Limits, AddressOfAProxyMayHaveManyConnections) {
     ServerOptions options = TwoThreads();
     options.limits.connections_per_address = 1;

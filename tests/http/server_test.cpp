@@ -16,32 +16,6 @@ namespace {
 using std::chrono::milliseconds;
 using std::chrono::seconds;
 
-// Keeps the responders of its requests until a test wants them answered.
-class Held {
-  public:
-    Handler handler() {
-        return [this](const Request&, Responder respond) { Push(std::move(respond)); };
-    }
-    Responder Take() {
-        std::unique_lock lock(mutex_);
-        EXPECT_TRUE(came_.wait_for(lock, seconds(5), [this] { return !responders_.empty(); }));
-        Responder first = std::move(responders_.front());
-        responders_.erase(responders_.begin());
-        return first;
-    }
-
-  private:
-    void Push(Responder respond) {
-        const std::lock_guard lock(mutex_);
-        responders_.push_back(std::move(respond));
-        came_.notify_all();
-    }
-
-    std::mutex mutex_;
-    std::condition_variable came_;
-    std::vector<Responder> responders_;
-};
-
 Response Text(std::string body) {
     Response response;
     response.body = std::move(body);

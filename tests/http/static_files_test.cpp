@@ -4,6 +4,7 @@
 #include <unistd.h>
 
 #include <fstream>
+#include <set>
 #include <thread>
 
 namespace zebtell::http {
@@ -93,6 +94,26 @@ TEST_F(StaticFilesTest, AnswersWhetherACopyIsStillGood) {
         EXPECT_EQ(answer->status, row.status) << row.headers.front().second;
         EXPECT_EQ(HeaderOf(*answer, "ETag"), tag);
         EXPECT_EQ(answer->shared_body == nullptr, row.status == 304);
+    }
+}
+
+TEST_F(StaticFilesTest, PacksTextsForThoseWhoTakeIt) {
+    const std::string style(5000, 's');
+    Write("site/long.css", style);
+    Write("site/long.png", style);
+    std::set<std::string> tags;
+    for (const char* coding : {"", "gzip", "br"}) {
+        const std::vector<Header> accept = {{"Accept-Encoding", coding}};
+        const auto packed = Ask("/static/long.css", accept);
+        EXPECT_EQ(HeaderOf(*packed, "Content-Encoding"), coding);
+        EXPECT_EQ(HeaderOf(*packed, "Vary"), "Accept-Encoding");
+        EXPECT_EQ(packed->shared_body->size() < 100, *coding != '\0');
+        const std::string tag = HeaderOf(*packed, "ETag");
+        EXPECT_TRUE(tags.insert(tag).second) << "other bytes, other tag: " << tag;
+        EXPECT_EQ(Status("/static/long.css", {accept[0], {"If-None-Match", tag}}), 304);
+        for (const char* as_it_is : {"/static/long.png", "/static/css/style.css"}) {
+            EXPECT_EQ(HeaderOf(*Ask(as_it_is, accept), "Content-Encoding"), "") << as_it_is;
+        }
     }
 }
 

@@ -32,6 +32,9 @@ class SelfSigned {
   public:
     SelfSigned() {
         fs::create_directories(folder_);
+        Renew();
+    }
+    void Renew() const {
         const Key key(EVP_EC_gen("P-256"));
         const Certificate certificate(X509_new());
         ASN1_INTEGER_set(X509_get_serialNumber(certificate.get()), 1);
@@ -80,6 +83,15 @@ class TlsClient {
         connected_ = SSL_connect(session_.get()) == 1;
     }
     bool connected() const { return connected_; }
+    // The server's, as its bytes.
+    std::string certificate() const {
+        const Certificate peer(SSL_get1_peer_certificate(session_.get()));
+        unsigned char* bytes = nullptr;
+        const int size = i2d_X509(peer.get(), &bytes);
+        std::string copy(reinterpret_cast<char*>(bytes), static_cast<std::size_t>(size));
+        OPENSSL_free(bytes);
+        return copy;
+    }
     std::string version() const { return SSL_get_version(session_.get()); }
     RawClient& socket() { return client_; }
 
@@ -166,6 +178,22 @@ TEST(Tls, SlowClientsAreClosed) {
     const auto begin = std::chrono::steady_clock::now();
     test.server.Stop();
     EXPECT_LT(std::chrono::steady_clock::now() - begin, std::chrono::seconds(1));
+}
+
+TEST(Tls, TakesARenewedCertificateForNewConnections) {
+    const SelfSigned files;
+    TestServer test(Echo, files.Options());
+    TlsClient before(test);
+    const std::string first = before.certificate();
+    files.Renew();
+    test.server.ReloadCertificate();
+    EXPECT_NE(TlsClient(test).certificate(), first);
+    before.Send(Get("/still"));
+    EXPECT_NE(before.ReadUntil("|/still|"), "");
+    fs::remove(files.key_file());
+    EXPECT_THROW(test.server.ReloadCertificate(), base::RuntimeError);
+    EXPECT_TRUE(TlsClient(test).connected()) << "with what was read before";
+    EXPECT_NO_THROW(TestServer().server.ReloadCertificate()) << "without TLS";
 }
 
 TEST(Tls, TellsFilesThatDoNotBelongTogether) {

@@ -157,6 +157,29 @@ TEST(PageRuntime, RefusesWhatAnotherSiteSends) {
     }
 }
 
+// Another site that makes the browser ask could learn from the packed length what stands beside the
+// text that it chose.
+TEST(PageRuntime, PacksLongPagesButNotForOtherSites) {
+    TestSite site;
+    Browser browser(site);
+    const http::Header gzip{"Accept-Encoding", "gzip"};
+    const std::string text(5000, 'x');
+    const auto ask = [&](std::vector<http::Header> headers) {
+        return browser.Get("/?page=Mall&event=Vaata&both=" + text, std::move(headers));
+    };
+    const auto plain = ask({});
+    const auto packed = ask({gzip});
+    EXPECT_EQ(plain.body, text);
+    EXPECT_EQ(HeaderOf(plain, "Vary"), "Accept-Encoding");
+    EXPECT_EQ(HeaderOf(plain, "Content-Encoding"), "(none)");
+    EXPECT_LT(packed.body.size(), 200U);
+    EXPECT_EQ(HeaderOf(packed, "Content-Encoding"), "gzip");
+    EXPECT_EQ(HeaderOf(packed, "Vary"), "Accept-Encoding");
+    const auto foreign = ask({gzip, {"Sec-Fetch-Site", "cross-site"}});
+    EXPECT_EQ(foreign.body, text);
+    EXPECT_EQ(HeaderOf(browser.Get("/", {gzip}), "Content-Encoding"), "(none)") << "short";
+}
+
 TEST(PageRuntime, SessionsKeepRenewAndReleaseTheirInstance) {
     TestSite site;
     Browser browser(site);
