@@ -7,6 +7,7 @@
 #include "app/portal.h"
 #include "app/process.h"
 #include "base/runtime_error.h"
+#include "check/check_portal.h"
 
 namespace zebtell::app {
 namespace {
@@ -39,6 +40,15 @@ void AwaitStop(const sigset_t& signals, Portal& portal) {
     }
 }
 
+// The portal serves all the same: its pages tell their users.
+void WarnOfDatabase(const std::filesystem::path& folder) {
+    const auto faults = check::DatabaseFaults(folder);
+    if (faults.empty()) return;
+    std::cerr << "zebtell: " << faults.front();
+    if (faults.size() > 1) std::cerr << " (and " << faults.size() - 1 << " more: zebtell check)";
+    std::cerr << std::endl;
+}
+
 }  // namespace
 
 int Serve(const std::filesystem::path& folder,
@@ -57,6 +67,7 @@ int Serve(const std::filesystem::path& folder,
     Portal portal(here, settings);
     std::cout << "ZEBTell serves " << (settings.TlsKey.empty() ? "http" : "https") << "://"
               << settings.Address << ":" << portal.port() << settings.BasePath << std::endl;
+    WarnOfDatabase(here);
     AwaitStop(signals, portal);
     std::cout << "ZEBTell stops" << std::endl;
     return 0;

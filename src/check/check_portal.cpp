@@ -50,6 +50,13 @@ markup::TemplateFolders TemplateFolders(const PortalFolders& folders) {
 
 }  // namespace
 
+std::vector<Finding> DatabaseFaults(const fs::path& component_folder) {
+    std::vector<Finding> findings;
+    const auto database = OpenDatabase(component_folder, findings);
+    if (database) Append(findings, MissingInDatabase(database->schema()));
+    return findings;
+}
+
 std::vector<Finding> CheckPortal(const PortalFolders& folders, std::span<const CheckedPage> pages) {
     // Without settings it is the wrong folder, and all else would only say so again.
     std::error_code error;

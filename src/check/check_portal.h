@@ -19,4 +19,7 @@ struct PortalFolders {
 // name, and the pages' templates in every language.
 std::vector<Finding> CheckPortal(const PortalFolders& folders, std::span<const CheckedPage> pages);
 
+// What the company database that the settings name lacks, or why it can't be read.
+std::vector<Finding> DatabaseFaults(const std::filesystem::path& component_folder);
+
 }  // namespace zebtell::check
