@@ -31,6 +31,8 @@ class OrderTable : public data::Table {
         return OpenStored(keys->Get(0, 0));
     }
 
+    std::int64_t FindKey(std::string_view key) override { return FindOrder(*session_, key); }
+
   private:
     std::shared_ptr<const KeyTable> Keys() { return session_->Keys(table_, filter_, ""); }
 

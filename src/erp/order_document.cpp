@@ -132,9 +132,9 @@ std::shared_ptr<data::RecordList> OrderDocument::Rows() {
     return RowsOf(order_);
 }
 
-void OrderDocument::Save() {
+data::Saved OrderDocument::Save() {
     const std::lock_guard lock(saving_);
-    SaveOrder(*order_);
+    return SaveOrder(*order_);
 }
 
 }  // namespace zebtell::erp

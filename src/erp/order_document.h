@@ -17,7 +17,8 @@ class OrderDocument : public data::Document {
     void SetField(std::string_view name, const base::Value& value) override;
     std::shared_ptr<data::Record> Header() override;
     std::shared_ptr<data::RecordList> Rows() override;
-    void Save() override;
+    std::string Key() const override { return order_->key; }
+    data::Saved Save() override;
 
   private:
     std::shared_ptr<Order> order_;

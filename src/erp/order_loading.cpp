@@ -41,6 +41,11 @@ void TakeCompany(Order& order) {
     }
 }
 
+std::string ReadKey(Connection& connection, std::int64_t id) {
+    const auto row = connection.Query({"SELECT DocKey FROM GDocument WHERE ID = ?", {id}});
+    return row->Next() ? row->Get(0).ToPlainText() : "";
+}
+
 std::shared_ptr<OrderRow> LoadedRow(const TableInfo& table,
                                     const OrderImage& image,
                                     std::size_t index) {
@@ -67,13 +72,14 @@ std::shared_ptr<Order> NewOrder(const std::shared_ptr<Session>& session) {
 }
 
 std::shared_ptr<Order> LoadOrder(const std::shared_ptr<Session>& session, std::int64_t id) {
+    auto order = std::make_shared<Order>(session);
     auto image = session->database().pool().Reading([&](Connection& connection) {
+        order->key = ReadKey(connection, id);
         return ReadOrderImage(session->database().translator(), session->reader(), connection, id);
     });
     if (!image) {
         return nullptr;
     }
-    auto order = std::make_shared<Order>(session);
     order->id = id;
     order->header.Take(*image->header, 0);
     const TableInfo& table = session->database().Table(kOrderRowTable);
@@ -83,6 +89,21 @@ std::shared_ptr<Order> LoadOrder(const std::shared_ptr<Session>& session, std::i
     order->image = std::move(image);
     order->changed = false;
     return order;
+}
+
+std::int64_t FindOrder(Session& session, std::string_view key) {
+    const BoundSql sql{
+        "SELECT d.ID FROM GDocument d INNER JOIN SDOrder o ON o.ID = d.ID "
+        "WHERE d.DocKey = ? AND o.IDGRCompany = ?",
+        {std::string(key), session.reader().partner}};
+    const auto id = session.database().pool().Reading([&sql](Connection& connection) {
+        const auto row = connection.Query(sql);
+        return row->Next() ? row->GetInteger(0) : 0;
+    });
+    if (id != 0) {
+        session.AddSavedDocument(id);
+    }
+    return id;
 }
 
 }  // namespace zebtell::erp

@@ -15,6 +15,7 @@ namespace {
 
 // What saving gave, for the order in memory.
 struct Stored {
+    data::Saved saved = data::Saved::kNow;
     std::int64_t id = 0;
     base::Value number;
     std::vector<std::int64_t> row_ids;  // by row; 0: not stored
@@ -95,6 +96,7 @@ bool Saving::IsStoredAlready() {
     if (!row->Next()) {
         return false;
     }
+    stored_.saved = data::Saved::kBefore;
     stored_.id = row->GetInteger(0);
     stored_.number = row->GetInteger(1);
     return true;
@@ -255,14 +257,17 @@ void Take(Order& order, Stored stored) {
 
 }  // namespace
 
-void SaveOrder(Order& order) {
+data::Saved SaveOrder(Order& order) {
     if (order.IsStored() && !order.changed) {
-        return;
+        return data::Saved::kBefore;
     }
     Recalculate(order);
-    Take(order, InTransaction(order.session()->database().pool(), [&order](Connection& connection) {
-             return Saving(order, connection).Run();
-         }));
+    Stored stored =
+        InTransaction(order.session()->database().pool(),
+                      [&order](Connection& connection) { return Saving(order, connection).Run(); });
+    const data::Saved saved = stored.saved;
+    Take(order, std::move(stored));
+    return saved;
 }
 
 }  // namespace zebtell::erp

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "data/document.h"
 #include "erp/order.h"
 
 namespace zebtell::erp {
@@ -8,6 +9,6 @@ namespace zebtell::erp {
 // that has succeeded. An unsaved order whose key is in the database takes the stored ID and number.
 // RuntimeError 5 when there is nothing to store, when staff have begun to process the stored order
 // or somebody has changed it.
-void SaveOrder(Order& order);
+data::Saved SaveOrder(Order& order);
 
 }  // namespace zebtell::erp

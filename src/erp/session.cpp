@@ -64,7 +64,11 @@ Session::Session(std::shared_ptr<CompanyDatabase> database, Reader reader, base:
       reader_key_(KeyOf(reader_)) {}
 
 void Session::AddSavedDocument(std::int64_t id) {
-    reader_.saved_documents.push_back(id);
+    auto& saved = reader_.saved_documents;
+    if (std::find(saved.begin(), saved.end(), id) != saved.end()) {
+        return;
+    }
+    saved.push_back(id);
     reader_key_ = KeyOf(reader_);
 }
 

@@ -27,7 +27,7 @@ class Session {
     const Reader& reader() const { return reader_; }
     const base::Clock& clock() const { return clock_; }
 
-    // From now on the reader sees this document, which he has just stored.
+    // From now on the reader sees this document, which he has stored.
     void AddSavedDocument(std::int64_t id);
 
     // The keys of a table's rows, with the columns that its records were looked up by so far and

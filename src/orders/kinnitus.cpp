@@ -60,6 +60,12 @@ bool Refused(TagCall& c) {
     return true;
 }
 
+bool DocKey(TagCall& c) {
+    data::Document* basket = c.state.basket.Basket.get();
+    c.tag.WriteEscaped(basket == nullptr ? "" : basket->Key());
+    return true;
+}
+
 // Reserved: the contents stand as they are.
 bool MaksuRida(TagCall& c) {
     c.tag.Show();
@@ -153,6 +159,7 @@ const tags::TagTable& KinnitusTagTable() {
         {"ZEB:KinnitRida", KinnitRida, "contents once for each row of the basket"},
         {"ZEB:SDOrderRow", OrderRow, "a field of the row; prices and sums with two decimals"},
         {"ZEB:SDOrder", Order, "a field of the order; Explanation as plain text"},
+        {"ZEB:DocKey", DocKey, "key of the order, for the form's hidden field ZEB_DocKey"},
         {"ZEB:MaksuRida", MaksuRida, "contents as they are"},
         {"ZEB:Recipient",
          Recipient,

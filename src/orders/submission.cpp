@@ -1,6 +1,7 @@
 #include "base/ignore_errors.h"
 #include "base/text.h"
 #include "host/errors.h"
+#include "host/texts.h"
 #include "orders/first_error.h"
 #include "orders/header_fields.h"
 #include "orders/kinnitus.h"
@@ -13,6 +14,18 @@ namespace zebtell::orders {
 namespace {
 
 using host::SessionState;
+
+constexpr host::LocalText kStoredBefore = {"Tellimus on salvestatud nii, nagu siin näha.",
+                                           "The order is stored as shown here.",
+                                           "Pasūtījums ir saglabāts tā, kā šeit redzams."};
+constexpr host::LocalText kNoBasket = {
+    "Tellimust ei salvestatud: seda korvi enam ei ole, palun koostage tellimus uuesti.",
+    "The order was not stored: this basket is gone, please make the order again.",
+    "Pasūtījums nav saglabāts: šī groza vairs nav, lūdzu, izveidojiet pasūtījumu no jauna."};
+constexpr host::LocalText kOtherBasket = {
+    "Tellimust ei salvestatud: korvis on nüüd teine tellimus, palun vaadake see üle.",
+    "The order was not stored: the basket holds another order now, please look it over.",
+    "Pasūtījums nav saglabāts: grozā tagad ir cits pasūtījums, lūdzu, pārbaudiet to."};
 
 std::string Posted(const web::Call& call, std::string_view field) {
     return tags::CleanFormValue(call.request.Form[field]);
@@ -58,18 +71,59 @@ void FillHeader(SessionState& state, const web::Call& call) {
     refusal.Rethrow();
 }
 
-void Store(SessionState& state, web::Call& call) {
-    if (RefusesOrders(state, call)) return call.RedirectTo("Kinnitus");
-    FillHeader(state, call);
-    state.basket.Basket->Save();
-    state.confirmation.ShownOrderFilter = "ID_" + state.basket.Basket->GetField("ID").ToPlainText();
-    data::DiscardBasket(state.basket);
-    state.confirmation.OrderJustSaved = true;
+bool PressedStore(const web::Call& call) {
+    return Pressed(call, "ZEB_But_Vormista") || Pressed(call, "ZEB_But_Vormista2");
+}
+
+// Leads to a stored order. When it was not this request that stored it, the page says so, unless
+// the thanks for it have not been seen yet.
+void ShowStored(SessionState& state, web::Call& call, const std::string& id, data::Saved saved) {
+    host::ConfirmationState& confirmation = state.confirmation;
+    const std::string filter = "ID_" + id;
+    const bool is_thanked_for =
+        confirmation.OrderJustSaved && confirmation.ShownOrderFilter == filter;
+    confirmation.OrderJustSaved = saved == data::Saved::kNow || is_thanked_for;
+    if (!confirmation.OrderJustSaved) {
+        state.Message = kStoredBefore.In(state.settings()->language());
+    }
+    confirmation.ShownOrderFilter = filter;
     // The order stands, whether it can be read at once or not: the page that shows it reads it
     // then.
     state.documents.ShownOrder = {};
     host::Guarded(state, "Kinnitus_LisaTellimus", [&] { tags::ReadShownOrder(state); });
     call.RedirectTo(Pressed(call, "ZEB_But_Vormista") ? "Tellimus" : "Kinnitatud");
+}
+
+void Store(SessionState& state, web::Call& call) {
+    if (RefusesOrders(state, call)) return call.RedirectTo("Kinnitus");
+    FillHeader(state, call);
+    const data::Saved saved = state.basket.Basket->Save();
+    const std::string id = state.basket.Basket->GetField("ID").ToPlainText();
+    data::DiscardBasket(state.basket);
+    ShowStored(state, call, id, saved);
+}
+
+// Whether the form was written for the basket that there is now. Forms without a key are believed.
+bool IsOfThisBasket(const SessionState& state, const web::Call& call) {
+    const std::string key = Posted(call, "ZEB_DocKey");
+    const data::Document* basket = state.basket.Basket.get();
+    return key.empty() || (basket != nullptr && basket->Key() == key);
+}
+
+// The form of a basket that was stored, dropped, or lost with its session. Nothing of it may get
+// into the basket that there is now.
+void AnswerLateForm(SessionState& state, web::Call& call) {
+    if (Pressed(call, "ZEB_But_Tagasi")) return call.RedirectTo("Kaubainfo");
+    const auto orders = state.application().OpenTable("SDOrder");
+    if (const std::int64_t id = orders->FindKey(Posted(call, "ZEB_DocKey"))) {
+        return ShowStored(state, call, std::to_string(id), data::Saved::kBefore);
+    }
+    const bool has_basket = state.basket.Basket != nullptr;
+    if (PressedStore(call)) {
+        const host::LocalText& text = has_basket ? kOtherBasket : kNoBasket;
+        state.Message = text.In(state.settings()->language());
+    }
+    call.RedirectTo(has_basket ? "Kinnitus" : "Kaubainfo");
 }
 
 void Drop(SessionState& state, web::Call& call) {
@@ -84,12 +138,14 @@ void Drop(SessionState& state, web::Call& call) {
 }
 
 void PressButton(SessionState& state, web::Call& call) {
-    if (Pressed(call, "ZEB_But_Tagasi")) {
+    if (!IsOfThisBasket(state, call)) {
+        AnswerLateForm(state, call);
+    } else if (Pressed(call, "ZEB_But_Tagasi")) {
         GoBack(state, call);
     } else if (!state.basket.Basket) {
         // A second click behind the one that stored the order is led to the order.
         call.RedirectTo(state.confirmation.OrderJustSaved ? "Tellimus" : "Kaubainfo");
-    } else if (Pressed(call, "ZEB_But_Vormista") || Pressed(call, "ZEB_But_Vormista2")) {
+    } else if (PressedStore(call)) {
         Store(state, call);
     } else if (Pressed(call, "ZEB_But_Kustuta")) {
         Drop(state, call);

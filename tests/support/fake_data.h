@@ -105,9 +105,11 @@ class Document : public data::Document {
     }
     std::shared_ptr<data::Record> Header() override { return header; }
     std::shared_ptr<data::RecordList> Rows() override { return rows; }
-    void Save() override {
+    std::string Key() const override { return "key"; }
+    data::Saved Save() override {
         if (save_error) throw *save_error;
         ++saves;
+        return data::Saved::kNow;
     }
 };
 
@@ -127,6 +129,7 @@ class Table : public data::Table {
         if (documents_.empty()) throw base::RuntimeError(base::errors::kSubscript);
         return documents_.front();
     }
+    std::int64_t FindKey(std::string_view) override { return 0; }
 
   private:
     Documents documents_;
