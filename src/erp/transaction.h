@@ -4,13 +4,15 @@
 
 namespace zebtell::erp {
 
-// A write transaction: rolled back unless it is committed.
+// A write transaction: rolled back unless it is committed. Then the connection is given up too,
+// since after an error (no room, a sync that failed) nobody knows what it and the disk hold.
 class Transaction {
   public:
     explicit Transaction(ConnectionPool& pool) : lease_(pool.Write()) { lease_->Begin(); }
     ~Transaction() {
         if (!committed_) {
             lease_->Rollback();
+            lease_.Drop();
         }
     }
     Transaction(const Transaction&) = delete;
@@ -21,12 +23,7 @@ class Transaction {
     // Throws when the database did not say that all is stored; never tried again, since it may be
     // stored all the same.
     void Commit() {
-        try {
-            lease_->Commit();
-        } catch (...) {
-            lease_.Drop();
-            throw;
-        }
+        lease_->Commit();
         committed_ = true;
     }
 
