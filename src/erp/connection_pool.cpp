@@ -17,7 +17,7 @@ void WaitFor(std::condition_variable& change,
              std::unique_lock<std::mutex>& lock,
              std::chrono::milliseconds limit,
              const Condition& condition) {
-    if (!change.wait_until(lock, std::chrono::system_clock::now() + limit, condition)) {
+    if (!change.wait_for(lock, limit, condition)) {
         throw base::RuntimeError(base::errors::kUnspecified, "The database is busy");
     }
 }

@@ -126,8 +126,18 @@ void AnswerLateForm(SessionState& state, web::Call& call) {
     call.RedirectTo(has_basket ? "Kinnitus" : "Kaubainfo");
 }
 
+// The ID of the order that the basket has become although saving it seemed to fail, since the
+// database's answer was lost; 0: none.
+std::int64_t StoredUnnoticed(SessionState& state) {
+    data::Document& basket = *state.basket.Basket;
+    const bool is_change_of_order = basket.GetField("ID").ToInteger64() != 0;
+    return is_change_of_order ? 0 : state.application().OpenTable("SDOrder")->FindKey(basket.Key());
+}
+
 void Drop(SessionState& state, web::Call& call) {
+    const std::int64_t stored = StoredUnnoticed(state);
     data::DiscardBasket(state.basket);
+    if (stored != 0) return ShowStored(state, call, std::to_string(stored), data::Saved::kBefore);
     base::IgnoreErrors([&] {
         if (base::EqualNoCase(Posted(call, "ZEB_Kustuta_Go"), "FirmaInfo")) {
             call.RedirectTo("Firmainfo");

@@ -110,6 +110,22 @@ TEST_F(LateForm, OfAChangedOrderShowsHowItStands) {
     EXPECT_EQ(NewOrders(), "7004|34\n");
 }
 
+TEST_F(LateForm, FindsTheOrderWhoseAnswerTheDatabaseLost) {
+    Browser mari = MariLoggedOn();
+    for (const char* button : {"ZEB_But_Vormista2", "ZEB_But_Kustuta"}) {
+        const std::string key = FillBasket(mari, "3");
+        company().Run("INSERT INTO GDocument (Kind, DocKey) VALUES ('SDOrder', '" + key +
+                      "'); INSERT INTO SDOrder (ID, Number, DocDate, IDGRCompany, Amount) SELECT "
+                      "max(ID), 7100 + max(ID), '2026-11-21', 1, 25.5 FROM GDocument");
+        const std::string orders = NewOrders();
+        Confirm(mari, key, button);
+        EXPECT_THAT(mari.Get("Tellimus"), HasSubstr("number=76")) << button;
+        EXPECT_THAT(mari.page(), HasSubstr("[tellimus (Tellimus on salvestatud")) << button;
+        EXPECT_THAT(mari.Get("Kaubainfo"), HasSubstr("[no basket]")) << button;
+        EXPECT_EQ(NewOrders(), orders) << button;
+    }
+}
+
 TEST_F(LateForm, KeysOfOthersSayNothing) {
     Browser mari = MariLoggedOn();
     const std::string key = FillBasket(mari, "3");
