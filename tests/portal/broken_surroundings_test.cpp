@@ -9,7 +9,6 @@ namespace zebtell {
 namespace {
 
 using ::testing::HasSubstr;
-using ::testing::Not;
 
 using BrokenSurroundings = PortalTest;
 
@@ -61,23 +60,6 @@ TEST_F(BrokenSurroundings, DatabaseMissingOrDamaged) {
     std::filesystem::rename(folder.path() / "away.db", database);
     EXPECT_THAT(MariLoggedOn().Get("Kaubainfo"), HasSubstr("[kaubad"));
     EXPECT_EQ(NewBrowser().Ask("/healthz", "GET", "").status, 200);
-}
-
-TEST_F(BrokenSurroundings, LockedDatabaseLosesNoBasket) {
-    Browser mari = MariLoggedOn();
-    mari.Get("Kaubainfo");
-    mari.Post("Kaubainfo&event=Lisamine", {{"ID_1101", "3"}});
-    {
-        CompanyFile other(folder.path() / "company.db");
-        other.Run("BEGIN IMMEDIATE");
-        mari.Post("Kinnitus&event=LisaTellimus",
-                  {{"ZEB_But_Vormista", "1"}, {"ZEB_Komment", "kiire"}});
-        EXPECT_THAT(mari.page(), HasSubstr("(Probleem tellimuse salvestamisel!) sum=25,50"));
-        EXPECT_THAT(mari.page(), HasSubstr("comment=kiire"));
-    }
-    mari.Post("Kinnitus&event=LisaTellimus", {{"ZEB_But_Vormista", "1"}, {"ZEB_Komment", "kiire"}});
-    EXPECT_THAT(mari.page(), HasSubstr("just saved number=7004"));
-    EXPECT_EQ(company().Run("SELECT count(*) FROM SDOrder WHERE Number = 7004"), "1\n");
 }
 
 TEST_F(BrokenSurroundings, LogThatCannotBeWritten) {
