@@ -20,7 +20,7 @@ struct Levels {
 
 // Pages are made for one reader, who waits: see docs/performance.md for what the levels cost.
 constexpr Levels LevelsOf(Effort effort) {
-    return effort == Effort::kQuick ? Levels{1, 1} : Levels{9, 9};
+    return effort == Effort::kQuick ? Levels{3, 4} : Levels{9, 9};
 }
 
 [[noreturn]] void Fail(std::string_view library) {
@@ -126,12 +126,14 @@ std::optional<int> WeightOf(const Names& names, std::string_view list) {
 
 }  // namespace
 
-Coding BestCoding(std::string_view accept_encoding) {
+Coding BestCoding(std::string_view accept_encoding, Effort effort) {
+    const Coding favourite = effort == Effort::kQuick ? Coding::kGzip : Coding::kBrotli;
     Coding best = Coding::kIdentity;
     int best_weight = 0;
     for (const Names& names : kNames) {
         const int weight = WeightOf(names, accept_encoding).value_or(0);
-        if (weight > best_weight) {
+        const bool is_favourite = names.coding == favourite && weight > 0;
+        if (weight > best_weight || (weight == best_weight && is_favourite)) {
             best = names.coding;
             best_weight = weight;
         }

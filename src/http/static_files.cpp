@@ -183,7 +183,7 @@ StaticFiles::FilePointer StaticFiles::Load(const std::string& name,
 }
 
 Response StaticFiles::Answer(const Request& request, const FilePointer& file) {
-    Coding coding = BestCoding(request.HeaderValue("Accept-Encoding"));
+    Coding coding = BestCoding(request.HeaderValue("Accept-Encoding"), Effort::kBest);
     if (file->BytesIn(coding).empty()) coding = Coding::kIdentity;
     const std::string etag = TagIn(file->etag, coding);
     Response response;

@@ -90,7 +90,8 @@ void SiteRuntime::Handle(const http::Request& request, http::Responder respond) 
     // What another site asked for in the customer's name is sent as it is: its packed length would
     // tell that site how much of what it chose stands in the page.
     if (!IsCrossSite(request))
-        job->coding = http::BestCoding(request.HeaderValue("Accept-Encoding"));
+        job->coding =
+            http::BestCoding(request.HeaderValue("Accept-Encoding"), http::Effort::kQuick);
     const Work work = WorkOf(job->request);
     if (work == Work::kLogOn) {
         job->place = TakePlace();

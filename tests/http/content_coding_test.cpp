@@ -56,7 +56,12 @@ TEST(ContentCoding, IsWhatTheClientLikesBest) {
         {"gzippy, brr", Coding::kIdentity},
         {",;,;q=1,", Coding::kIdentity},
     };
-    for (const auto& row : rows) EXPECT_EQ(BestCoding(row.accept), row.coding) << row.accept;
+    for (const auto& row : rows) {
+        EXPECT_EQ(BestCoding(row.accept, Effort::kBest), row.coding) << row.accept;
+    }
+    EXPECT_EQ(BestCoding("br, gzip, *", Effort::kQuick), Coding::kGzip);
+    EXPECT_EQ(BestCoding("br, gzip;q=0.9", Effort::kQuick), Coding::kBrotli);
+    EXPECT_EQ(BestCoding("br", Effort::kQuick), Coding::kBrotli);
 }
 
 // Several threads, each of which keeps its working memory from text to text.

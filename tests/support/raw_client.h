@@ -37,8 +37,18 @@ struct RawResponse {
 // or ends too early, is a std::runtime_error.
 class RawClient {
   public:
-    explicit RawClient(std::uint16_t port) : fd_(::socket(AF_INET, SOCK_STREAM, 0)) {
+    // To this machine, where the whole network 127.0.0.0/8 is; `from` one of its addresses, or null
+    // for the usual one.
+    explicit RawClient(std::uint16_t port, const char* from = nullptr)
+        : fd_(::socket(AF_INET, SOCK_STREAM, 0)) {
         sockaddr_in address{};
+        address.sin_family = AF_INET;
+        if (from != nullptr) inet_pton(AF_INET, from, &address.sin_addr);
+        if (from != nullptr &&
+            ::bind(fd_, reinterpret_cast<sockaddr*>(&address), sizeof address) != 0) {
+            ::close(fd_);
+            throw std::runtime_error("cannot bind");
+        }
         address.sin_family = AF_INET;
         address.sin_port = htons(port);
         address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
@@ -75,6 +85,14 @@ class RawClient {
     RawResponse Ask(std::string_view bytes) {
         Send(bytes);
         return Read();
+    }
+
+    // All that comes until nothing does for that long, or the server closes.
+    std::string ReadUntilQuiet(std::chrono::milliseconds time) {
+        pollfd poll{fd_, POLLIN, 0};
+        while (::poll(&poll, 1, static_cast<int>(time.count())) == 1 && Receive()) {
+        }
+        return std::exchange(received_, {});
     }
 
     // Whether the server ends the connection, without a further byte, within the time limit.
