@@ -1,16 +1,19 @@
+#include <chrono>
 #include <fstream>
 #include <iostream>
 
 #include "app/commands.h"
 #include "base/runtime_error.h"
-#include "erp/connection.h"
-#include "erp/database.h"
+#include "erp/odbc/backend.h"
 #include "host/settings.h"
 
 namespace zebtell::app {
 namespace {
 
 namespace fs = std::filesystem;
+
+constexpr std::chrono::seconds kConnectLimit{5};
+constexpr std::chrono::seconds kIndexLimit{600};  // one index of a large company
 
 constexpr std::string_view kLogons =
     "Log on with one of these:\n"
@@ -38,7 +41,10 @@ bool MakeOnServer(const fs::path& folder, const demo::DemoOptions& options) {
     const host::Settings settings = host::LoadSettings(folder);
     if (settings.Type == data::DatabaseType::kSqlite) return false;
     std::cout << "Making the demo company in the database that ZEBTell.ini names" << std::endl;
-    demo::MakeDemoCompany(*erp::MakeBackend(settings.Type, settings.Path), options);
+    erp::odbc::OdbcBackend server(settings.Path,
+                                  erp::odbc::SqlServer(),
+                                  {.connect = kConnectLimit, .statement = kIndexLimit});
+    demo::MakeDemoCompany(server, options);
     std::cout << kLogons;
     return true;
 }

@@ -24,25 +24,25 @@ const StatementRow kStatements[] = {
     {"select 'a' + Code + 1 x, Code || ID, ID+1+2+Code from GRArticle where ID=1",
      "select ? || t1.Code || ? as x, t1.Code || t1.ID as Column2, (t1.ID + ? + ?) || t1.Code as "
      "Column3 from GRArticle t1 where t1.ID = ? <- a, 1, 1, 2, 1",
-     "select ? + t1.Code + cast(? as nvarchar(4000)) as x, t1.Code + cast(t1.ID as "
-     "nvarchar(4000)) as Column2, cast((t1.ID + ? + ?) as nvarchar(4000)) + t1.Code as Column3 "
-     "from GRArticle t1 where t1.ID = ? <- a, 1, 1, 2, 1",
+     "select ? + t1.Code + cast(1 as nvarchar(4000)) as x, t1.Code + cast(t1.ID as "
+     "nvarchar(4000)) as Column2, cast((t1.ID + 1 + 2) as nvarchar(4000)) + t1.Code as Column3 "
+     "from GRArticle t1 where t1.ID = ? <- a, 1",
      "aM6-201|M6-201|4M6-20"},
     {"select 7/2, 7/2/2, 7.5/2, ID/2, (ID+1)/2*3, 7%4, 1/0, 5/ID/2 from GRArticle where ID=1",
      "select ? / ? as Column1, ? / ? / ? as Column2, erp_div(?, ?) as Column3, erp_div(t1.ID, ?) "
      "as Column4, erp_div((t1.ID + ?), ?) * ? as Column5, ? % ? as Column6, ? / ? as Column7, "
      "erp_div(erp_div(?, t1.ID), ?) as Column8 from GRArticle t1 where t1.ID = ? <- 7, 2, 7, 2, "
      "2, 7.5, 2, 2, 1, 2, 3, 7, 4, 1, 0, 5, 2, 1",
-     "select ? / nullif(?, 0) as Column1, ? / nullif(?, 0) / nullif(?, 0) as Column2, 7.5 * 1.0 / "
-     "nullif(?, 0) as Column3, t1.ID * 1.0 / nullif(?, 0) as Column4, (t1.ID + ?) * 1.0 / "
-     "nullif(?, 0) * ? as Column5, ? % nullif(?, 0) as Column6, ? / nullif(?, 0) as Column7, ? * "
-     "1.0 / nullif(t1.ID, 0) * 1.0 / nullif(?, 0) as Column8 from GRArticle t1 where t1.ID = ? <- "
-     "7, 2, 7, 2, 2, 2, 2, 1, 2, 3, 7, 4, 1, 0, 5, 2, 1",
+     "select 7 / 2 as Column1, 7 / 2 / 2 as Column2, 7.5 * 1.0 / 2 as Column3, t1.ID * 1.0 / 2 as "
+     "Column4, (t1.ID + 1) * 1.0 / 2 * 3 as Column5, 7 % 4 as Column6, 1 / nullif(?, 0) as "
+     "Column7, 5 * 1.0 / nullif(t1.ID, 0) * 1.0 / 2 as Column8 from GRArticle t1 where t1.ID = ? "
+     "<- 0, 1",
      "3|1|3.75|0.5|3|3||2.5"},
     {"select -ID, - -3, ID - -3, -(-ID), +5 from GRArticle where ID=1",
      "select -(t1.ID) as Column1, ? as Column2, t1.ID - ? as Column3, -(-(t1.ID)) as Column4, ? as "
      "Column5 from GRArticle t1 where t1.ID = ? <- 3, -3, 5, 1",
-     nullptr,
+     "select -(t1.ID) as Column1, ? as Column2, t1.ID - -3 as Column3, -(-(t1.ID)) as Column4, ? "
+     "as Column5 from GRArticle t1 where t1.ID = ? <- 3, 5, 1",
      "-1|3|4|1|5"},
     {"select distinct case when ID>2 then 'x''y' else 'z' end k, count(*) from GRArticle group by "
      "case when ID>2 then 'x''y' else 'z' end having count(*)>1 order by k",
@@ -120,10 +120,8 @@ const StatementRow kStatements[] = {
      nullptr,
      "select t1.ID as ID from GRArticle t1 where (t1.Code in (select cast(value as nvarchar(20)) "
      "from openjson(cast(? as nvarchar(max))) with (value bigint '$')) or t1.Code in (?, ?) or "
-     "t1.ID in (select value "
-     "from openjson(cast(? as nvarchar(max))) with (value bigint '$')) or t1.ID in ((? + ?))) "
-     "order by t1.ID <- [10,20], "
-     "V100, x, [], 1, 1",
+     "t1.ID in (select value from openjson(cast(? as nvarchar(max))) with (value bigint '$')) or "
+     "t1.ID in ((1 + 1))) order by t1.ID <- [10,20], V100, x, []",
      "2;3"},
     {"select x.n, (select max(Price) from GRPriceListRel where IDGRArticle=x.k) from (select top 2 "
      "Name n, ID as k from GRArticle order by ID desc) x order by x.k",
@@ -151,6 +149,12 @@ const StatementRow kStatements[] = {
      "round(cast(t1.Amount * 0.5 as decimal(28, 10)), 1) = ? group by t1.Number, t1.DocDate order "
      "by t1.Number <- 1, min_, 5",
      "1|2026-11-20 1|100"},
+    {"select ID from GRArticle where Code = 5 or Code in ('x', 7) or 9 < Code and ID = 4",
+     "select t1.ID as ID from GRArticle t1 where (t1.Code = ? or t1.Code in (?, ?) or (? < t1.Code "
+     "and t1.ID = ?)) <- 5, x, 7, 9, 4",
+     "select t1.ID as ID from GRArticle t1 where (t1.Code = ? or t1.Code in (?, ?) or (? < t1.Code "
+     "and t1.ID = ?)) <- 5, x, 7, 9, 4",
+     "4"},
     {"select 1 [user], x.[percent] from (select ID [percent] from GRTax with (nolock)) x "
      "with (nolock) where x.[percent]=2",
      "select ? as \"user\", t2.\"percent\" as \"percent\" from (select t1.ID as \"percent\" from "

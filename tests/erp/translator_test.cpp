@@ -269,8 +269,8 @@ TEST(TranslatorTest, PriceQueryOfBothDatabases) {
     EXPECT_EQ(Shown(server.Select(FirstCustomer(), kPriceQuery)),
               "select t1.ID as ID, t1.IDGRPriceList as IDGRPriceList, t1.IDSrcPriceList as "
               "IDSrcPriceList, t1.IDGRArticle as IDGRArticle, t1.Price as Price, t5.idgrcompany as "
-              "idgrcompany, isnull(t5.PriceCut, ?) as pricecut, round(cast(t1.Price * (? + "
-              "isnull(t5.PriceCut, ?)) as decimal(28, 10)), 0) * 1.0 / nullif(?, 0) as finalprice "
+              "idgrcompany, isnull(t5.PriceCut, ?) as pricecut, round(cast(t1.Price * (100 + "
+              "isnull(t5.PriceCut, ?)) as decimal(28, 10)), 0) * 1.0 / 100 as finalprice "
               "from SQPriceList5 t1 with (nolock) left join (select t2.PriceCut as PriceCut, "
               "t2.IDGRPriceList as IDGRPriceList, t4.ID as idgrcompany, t3.ID as idgrarticle from "
               "GRPriceCatRel t2 with (nolock) inner join GRArticle t3 with (nolock) on "
@@ -282,8 +282,8 @@ TEST(TranslatorTest, PriceQueryOfBothDatabases) {
               "t1.IDSrcPriceList = t5.IDGRPriceList where t1.IDGRPriceList in (select value from "
               "openjson(cast(? as nvarchar(max))) with (value bigint '$')) and t1.IDGRPriceList "
               "= ? and t1.IDGRArticle in "
-              "(select value from openjson(cast(? as nvarchar(max))) with (value bigint '$'))" +
-                  values);
+              "(select value from openjson(cast(? as nvarchar(max))) with (value bigint '$'))"
+              " <- 0, 0, 1, 3, 3, 1, 1, [1,2,3], [20,10], 20, [1,2,3]");
 }
 
 // A guest without a company, and a customer who asks for another's category, pay the list price.

@@ -59,7 +59,8 @@ test('SQL Server takes every statement that the runtime asks it', () => {
   }
   const all = [...programs.values()].flat().join('\n').toLowerCase();
   const constructs = [
-    'openjson(cast(? as nvarchar(max))) with', 'set identity_insert grarticle on; insert into', "escape '\\'", 'with (nolock)', 'top (', 'with (updlock, holdlock)',
+    'openjson(cast(? as nvarchar(max))) with', 'set identity_insert grarticle on; insert into',
+    "escape '\\'", 'with (nolock)', 'top (', 'with (updlock, holdlock)',
     'insert into sdorderrow', 'update sdorder ', 'delete from gdtax', 'left join', 'exists (',
     'cast(', 'group by', 'count_big', 'nullif(', 'case when', ' as [',
   ];
@@ -70,7 +71,7 @@ test('SQL Server takes the scripts', () => {
   const counts = {};
   for (const name of readdirSync(scripts)) {
     const statements = script(name);
-    assert.ok(statements.length > 2, name);
+    assert.ok(statements.length > 1, name);
     assert.deepEqual(faultsOf(statements, counts), [], name);
   }
   console.log('what the grammar does not know:', counts);

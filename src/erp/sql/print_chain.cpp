@@ -8,12 +8,33 @@ struct Operand {
     BoundSql text;
     ValueType type;
     char operation;  // that joined it; ' ' for one operand
+    bool is_number;  // written, and not 0
 };
 
+bool IsWrittenNumber(const Expr& value) {
+    const auto* literal = std::get_if<Literal>(&value.node);
+    return literal && !literal->value.IsNull() && !literal->value.As<std::string>() &&
+           !literal->value.As<base::DateTime>() && literal->value.ToDouble() != 0;
+}
+
+// SQL Server computes with as many digits as the types of both numbers may have, and drops decimals
+// when these are too many: a written 100 has three, where a value would have 19.
 Operand PrintTerm(Context& context, const Chain::Term& term, Scope& scope) {
-    Operand operand{{}, ValueType::kUnknown, ' '};
+    const bool is_number = IsWrittenNumber(*term.operand);
+    const bool is_written = is_number && context.dialect == Dialect::kSqlServer;
+    const Temporarily<bool> literals(context.inline_literals,
+                                     context.inline_literals || is_written);
+    Operand operand{{}, ValueType::kUnknown, ' ', is_number};
     operand.type = PrintOperand(context, *term.operand, scope, operand.text);
     return operand;
+}
+
+// Divided by 0, SQLite gives null, where SQL Server ends the statement.
+void AppendDivisor(const Context& context, BoundSql& out, Operand&& divisor) {
+    const bool may_be_zero = context.dialect == Dialect::kSqlServer && !divisor.is_number;
+    out.text += may_be_zero ? "nullif(" : "";
+    Append(out, std::move(divisor.text));
+    out.text += may_be_zero ? ", 0)" : "";
 }
 
 void Wrap(BoundSql& text, std::string_view before, std::string_view after) {
@@ -56,22 +77,21 @@ void DivideExactly(const Context& context, Operand& left, Operand&& right) {
         Append(left.text, std::move(right.text));
         left.text.text += ')';
     } else {
-        left.text.text += " * 1.0 / nullif(";
-        Append(left.text, std::move(right.text));
-        left.text.text += ", 0)";
+        left.text.text += " * 1.0 / ";
+        AppendDivisor(context, left.text, std::move(right));
     }
     left.type = ValueType::kNumber;
     left.operation = '/';
 }
 
 void Compute(const Context& context, char operation, Operand& left, Operand&& right) {
-    // Divided by 0, SQLite gives null, where SQL Server ends the statement.
-    if (context.dialect == Dialect::kSqlServer && (operation == '/' || operation == '%')) {
-        Wrap(right.text, "nullif(", ", 0)");
-    }
-    left.text.text.append(" ").append(1, operation).append(" ");
-    Append(left.text, std::move(right.text));
     left.type = AreWhole(left, right) ? ValueType::kInteger : ValueType::kNumber;
+    left.text.text.append(" ").append(1, operation).append(" ");
+    if (operation == '/' || operation == '%') {
+        AppendDivisor(context, left.text, std::move(right));
+    } else {
+        Append(left.text, std::move(right.text));
+    }
     left.operation = operation;
 }
 

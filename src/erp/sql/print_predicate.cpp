@@ -8,14 +8,20 @@ namespace {
 
 constexpr std::size_t kMostMarks = 500;  // of one list
 
-// A date written as a text, compared with one that the database holds.
-void TurnIntoDate(const Expr& written, ValueType compared_with, BoundSql& printed) {
+// A date written as a text, compared with one that the database holds, is a date; a number compared
+// with a text is a text, since SQL Server would make a number of every text to compare.
+void TurnInto(ValueType compared_with, const Expr& written, BoundSql& printed) {
     const auto* literal = std::get_if<Literal>(&written.node);
-    const auto* text = literal ? literal->value.As<std::string>() : nullptr;
-    if (text && compared_with == ValueType::kDate && printed.text == "?") {
+    if (!literal || printed.text != "?") {
+        return;
+    }
+    const auto* text = literal->value.As<std::string>();
+    if (text && compared_with == ValueType::kDate) {
         if (const auto date = base::DateTime::FromIso(*text)) {
             printed.values.back() = *date;
         }
+    } else if (compared_with == ValueType::kText && literal->value.As<std::int64_t>()) {
+        printed.values.back() = literal->value.ToPlainText();
     }
 }
 
@@ -29,8 +35,8 @@ struct PredicatePrinter {
         BoundSql right;
         const ValueType left_type = PrintValue(context, *comparison.left, scope, left);
         const ValueType right_type = PrintValue(context, *comparison.right, scope, right);
-        TurnIntoDate(*comparison.left, right_type, left);
-        TurnIntoDate(*comparison.right, left_type, right);
+        TurnInto(right_type, *comparison.left, left);
+        TurnInto(left_type, *comparison.right, right);
         Append(out, std::move(left));
         out.text.append(" ").append(comparison.operation).append(" ");
         Append(out, std::move(right));
@@ -132,7 +138,7 @@ struct PredicatePrinter {
     void PrintCompared(const Expr& value, ValueType with) const {
         BoundSql printed;
         PrintOperand(context, value, scope, printed);
-        TurnIntoDate(value, with, printed);
+        TurnInto(with, value, printed);
         Append(out, std::move(printed));
     }
 };
