@@ -62,6 +62,8 @@ int Serve(const std::filesystem::path& folder,
     // Blocked before any thread is there, so that only the wait below gets them.
     const sigset_t signals = AwaitedSignals(!settings.TlsKey.empty());
     pthread_sigmask(SIG_BLOCK, &signals, nullptr);
+    // A file that may not grow any more is an error of that write, not the end of the portal.
+    std::signal(SIGXFSZ, SIG_IGN);
 
     if (IsRoot()) std::cerr << "zebtell: runs as root, and needs no such rights" << std::endl;
     Portal portal(here, settings);

@@ -1,7 +1,7 @@
 #!/usr/bin/env python3
 """Customers order while the portal is killed again and again; then every order is checked.
 
-torture.py PROGRAM TEMPLATES [--kills 100] [--seconds 60] [--customers 4] [--seed N]
+torture.py PROGRAM [--kills 100] [--seconds 60] [--customers 4] [--seed N]
 
 A customer whose confirmation was not answered sends the same form again when the portal is back,
 and is told whether his order was stored. In the end the database must hold the orders that were
@@ -40,15 +40,16 @@ class Gone(Exception):
 class Portal:
     def __init__(self, program, folder):
         self.command = [program, "serve", "--folder", folder, "--port", "0"]
+        self.errors = Path(folder, "errors")
         self.up = threading.Event()
         self.storing = threading.Event()  # a confirmation is on its way
         self.start_times = []
 
     def start(self):
         begin = time.monotonic()
-        # Python ignores SIGXFSZ, and so does what it starts.
-        self.process = subprocess.Popen(self.command, stdout=subprocess.PIPE, text=True,
-                                        restore_signals=False)
+        with open(self.errors, "a", encoding="utf-8") as errors:
+            self.process = subprocess.Popen(self.command, stdout=subprocess.PIPE, stderr=errors,
+                                            text=True)
         self.port = int(re.search(r":(\d+)/", self.process.stdout.readline()).group(1))
         connection = http.client.HTTPConnection("127.0.0.1", self.port, timeout=20)
         connection.request("GET", "/?page=Logon")
@@ -310,7 +311,6 @@ def leave_long_log(database, megabytes):
 def main():
     options = argparse.ArgumentParser(usage=__doc__)
     options.add_argument("program")
-    options.add_argument("templates")
     options.add_argument("--kills", type=int, default=100)
     options.add_argument("--seconds", type=float, default=60)
     options.add_argument("--customers", type=int, default=4)
@@ -319,8 +319,8 @@ def main():
     print(f"torture: seed {options.seed}", flush=True)
     rng = random.Random(options.seed)
     with tempfile.TemporaryDirectory() as folder:
-        subprocess.run([options.program, "demo", "--folder", folder, "--templates",
-                        options.templates], check=True, stdout=subprocess.DEVNULL)
+        subprocess.run([options.program, "demo", "--folder", folder], check=True,
+                       stdout=subprocess.DEVNULL)
         database = str(Path(folder, "company.db"))
         before = read(database, "SELECT count(*), max(Number), (SELECT count(*) FROM GDocument) "
                       "FROM SDOrder")[0]
@@ -345,6 +345,7 @@ def main():
               f"{unanswered} confirmations without an answer; restart "
               f"{statistics.median(times):.3f} s, at most {max(times):.3f} s, "
               f"{times[-1]:.3f} s with a write-ahead log of {log_size:.0f} MB")
+        print("".join(sorted(set(open(portal.errors, encoding="utf-8")))), end="")
         assert kills >= options.kills / 2 and unanswered > 0, "the test has not tested much"
         assert statistics.median(times) < 1 and times[-1] < 1, "the restart takes too long"
 
