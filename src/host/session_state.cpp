@@ -69,6 +69,7 @@ bool CheckLogon(SessionState& state, web::Call& call) {
         WriteLog(state, "Forced to logon - timeout or bad link", log_Normal);
         state.Message = "Sessioon katkestatud - sisenege uuesti!";
     }
+    if (call.request.method == "POST") state.logon.LostForm = true;
     call.RedirectTo("Logon");
     return false;
 }

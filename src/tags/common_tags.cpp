@@ -1,3 +1,5 @@
+#include <utility>
+
 #include "base/text.h"
 #include "markup/escape.h"
 #include "tags/combo.h"
@@ -37,6 +39,12 @@ bool WEBMessage(TagCall& call) {
 bool WEBLanguage(TagCall& call) {
     PageLanguage = base::Trimmed(call.tag.TemplateContents());
     call.tag.Hide();
+    return kHandled;
+}
+
+bool Interrupted(TagCall& call) {
+    auto& logon = call.state.logon;
+    ShowIf(call, logon.LoggedOn && std::exchange(logon.LostForm, false));
     return kHandled;
 }
 
@@ -128,6 +136,9 @@ const TagTable& CommonTagTable() {
         {"ZEB:WEBGuest", WEBGuest, "Contents for the guest only"},
         {"ZEB:WEBUser", WEBUser, "Contents for named users only"},
         {"ZEB:WEBMessage", WEBMessage, "Once: contents with the message in place of \"Message\""},
+        {"ZEB:Interrupted",
+         Interrupted,
+         "Once behind a log-on: contents when a form was lost with the session before"},
         {"ZEB:WEBLanguage", WEBLanguage, "Sets the page's language"},
         {"ZEB:Lang", Lang, "Code of the language that the page is in: et, en, lv"},
         {"ZEB:Text", Text, "Contents in the language of the page"},

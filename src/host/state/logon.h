@@ -17,6 +17,8 @@ struct LogonState {
     bool IsGuest = false;
     std::string Password;    // recognises a repeated log-on with the same credentials
     std::string ReturnPage;  // page to go to after log-on instead of the frameset; empty: none
+    bool LostForm =
+        false;  // a form came while nobody was logged on, and the user has not been told
     std::unique_ptr<data::DataApplication> Application;  // none: logged off
 };
 
