@@ -7,7 +7,7 @@ namespace zebtell::check {
 namespace {
 
 TEST_F(CheckTest, DefaultTemplatesHaveNoFaults) {
-    EXPECT_EQ(Faults(SourceFolder() / "templates"), "");
+    EXPECT_EQ(Faults(DefaultTemplates()), "");
 }
 
 TEST_F(CheckTest, EveryTemplateOfThePageTableIsRead) {

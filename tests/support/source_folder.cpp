@@ -6,4 +6,8 @@ std::filesystem::path SourceFolder() {
     return ZEBTELL_SOURCE_FOLDER;
 }
 
+std::filesystem::path DefaultTemplates() {
+    return ZEBTELL_DEFAULT_TEMPLATES;
+}
+
 }  // namespace zebtell
