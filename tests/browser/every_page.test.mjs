@@ -4,7 +4,7 @@ import assert from 'node:assert/strict';
 import { after, before, describe, test } from 'node:test';
 import { Visitor, languages, openBrowser } from './portal.mjs';
 
-const timeout = 60_000;
+const timeout = 300_000;
 let browser;
 
 before(async () => (browser = await openBrowser()));

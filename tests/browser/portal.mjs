@@ -101,7 +101,7 @@ export class Visitor {
   // Does what leads to another page, and waits for that and for its check: a browser forgets what
   // it was sent when it goes on.
   async arrive(action) {
-    await Promise.all([this.page.waitForEvent('domcontentloaded'), action()]);
+    await Promise.all([this.page.waitForEvent('domcontentloaded', { timeout: 60_000 }), action()]);
     await Promise.all(this.checks);
   }
 
