@@ -17,6 +17,8 @@ using host::CatalogueState;
 using host::SessionState;
 
 constexpr std::int32_t kFavouritesCategory = -1;
+// A session keeps no longer texts of what is searched for and sorted by.
+constexpr std::size_t kLongestTyped = 1000;
 constexpr std::string_view kReadingFailed = "Probleem andmete lugemisel, proovige uuesti!";
 
 // What became of a form is said once.
@@ -45,7 +47,8 @@ void BuildAndShow(SessionState& state, web::Call& call, std::string_view handler
 }
 
 std::string Posted(const web::Call& call, std::string_view field) {
-    return tags::CleanFormValue(call.request.Form[field]);
+    const std::string typed = call.request.Form[field];
+    return tags::CleanFormValue(base::FirstCharacters(typed, kLongestTyped));
 }
 
 void ReadSearch(CatalogueState& catalogue, const web::Call& call) {

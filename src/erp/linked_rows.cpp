@@ -5,7 +5,7 @@ namespace zebtell::erp {
 base::Value LinkedRows::Get(const TableInfo& table,
                             std::int64_t id,
                             std::string_view path,
-                            std::span<const std::int64_t> others) {
+                            const Keys& others) {
     Known& known = tables_[table.name];
     if (!known.row_of.contains(id) || !known.rows->fields().Find(path)) {
         Read(known, table, id, path, others);
@@ -18,10 +18,10 @@ void LinkedRows::Read(Known& known,
                       const TableInfo& table,
                       std::int64_t id,
                       std::string_view path,
-                      std::span<const std::int64_t> others) {
+                      const Keys& others) {
     std::unordered_map<std::int64_t, std::size_t> row_of{{id, 0}};
     std::vector<std::int64_t> ids{id};
-    for (const std::int64_t other : others) {
+    for (const std::int64_t other : others()) {
         if (row_of.try_emplace(other, ids.size()).second) {
             ids.push_back(other);
         }

@@ -1,8 +1,8 @@
 #pragma once
 
 #include <cstdint>
+#include <functional>
 #include <memory>
-#include <span>
 #include <string>
 #include <string_view>
 #include <unordered_map>
@@ -20,11 +20,13 @@ class LinkedRows {
     explicit LinkedRows(std::shared_ptr<Session> session) : session_(std::move(session)) {}
 
     // The field or dotted path `path` of the record `id` of `table`; null when there is none.
-    // `others` are keys of the same table that are likely to be asked for next.
+    // `others` gives keys of the same table that are likely to be asked for next; it is called
+    // when something has to be read.
+    using Keys = std::function<std::vector<std::int64_t>()>;
     base::Value Get(const TableInfo& table,
                     std::int64_t id,
                     std::string_view path,
-                    std::span<const std::int64_t> others);
+                    const Keys& others);
 
   private:
     struct Known {
@@ -36,7 +38,7 @@ class LinkedRows {
               const TableInfo& table,
               std::int64_t id,
               std::string_view path,
-              std::span<const std::int64_t> others);
+              const Keys& others);
 
     std::shared_ptr<Session> session_;
     std::unordered_map<std::string, Known> tables_;

@@ -9,8 +9,9 @@
 namespace zebtell::erp {
 namespace {
 
-// As many as the pages count.
-constexpr std::size_t kMostRows = 32'000;
+// More than anybody types. Each page shows them all, and each takes memory for as long as the
+// session lasts.
+constexpr std::size_t kMostRows = 2'000;
 
 [[noreturn]] void Refuse(const char* why) {
     throw base::RuntimeError(base::errors::kInvalidCall, why);
@@ -174,11 +175,9 @@ base::Value Order::BehindLink(const RecordFields& fields, std::string_view path)
     if (key == 0) {
         return base::Value::Null();
     }
-    std::vector<std::int64_t> others;
-    if (&fields != &header) {
-        others = LinkedKeys(link->name);
-    }
-    return linked_.Get(target, key, path.substr(dot + 1), others);
+    return linked_.Get(target, key, path.substr(dot + 1), [&] {
+        return &fields == &header ? std::vector<std::int64_t>() : LinkedKeys(link->name);
+    });
 }
 
 std::vector<std::int64_t> Order::LinkedKeys(std::string_view column) const {

@@ -98,12 +98,15 @@ base::Value QueryRows::Linked(std::size_t row, std::string_view link, std::strin
     if (!target) {
         NoSuchField(link);
     }
-    std::vector<std::int64_t> others;
-    const std::size_t end = std::min(rows_->count(), row + kLinkedAtOnce);
-    for (std::size_t other = row; other < end; ++other) {
-        others.push_back(KeyOf(rows_->Get(other, *field)));
-    }
-    return linked_.Get(*target, others.front(), path, others);
+    const auto following = [&] {
+        std::vector<std::int64_t> keys;
+        const std::size_t end = std::min(rows_->count(), row + kLinkedAtOnce);
+        for (std::size_t other = row; other < end; ++other) {
+            keys.push_back(KeyOf(rows_->Get(other, *field)));
+        }
+        return keys;
+    };
+    return linked_.Get(*target, KeyOf(rows_->Get(row, *field)), path, following);
 }
 
 std::int64_t QueryList::Count() {

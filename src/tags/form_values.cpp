@@ -12,6 +12,11 @@ namespace {
 
 constexpr int kMostDecimals = 15;
 
+// What a session keeps of forms. They have a few such fields; a stranger who logs on as the guest
+// could send them without end.
+constexpr std::size_t kMostSavedValues = 200;
+constexpr std::size_t kLongestSavedText = 4000;  // bytes of a name or a value
+
 std::string QueryKey(std::string_view name, std::string_view page) {
     std::string key;
     key.reserve(page.size() + 2 + name.size());
@@ -39,6 +44,8 @@ bool SaveFormValues(host::SessionState& state, const web::Request& request) {
         if (!base::StartsWithNoCase(name, "save_")) continue;
         auto& saved = state.templates.SavedValues;
         if (!saved) saved.emplace();
+        const bool has_room = saved->size() < kMostSavedValues || saved->contains(name);
+        if (!has_room || std::max(name.size(), field.value.size()) > kLongestSavedText) continue;
         saved->insert_or_assign(std::move(name), CleanFormValue(field.value));
     }
     return true;

@@ -50,6 +50,13 @@ TEST(SaveFormValues, KeepsWhatIsMarked) {
     EXPECT_EQ(saved->size(), 2U);
     EXPECT_EQ(saved->find("SAVE_A")->second, "one");
     EXPECT_EQ(saved->find("save_b")->second, "three");
+
+    std::vector<web::Field> many = {{"save_long", std::string(5000, 'x')}};
+    for (int i = 0; i < 1000; ++i) many.push_back({"save_" + std::to_string(i), "x"});
+    SaveFormValues(session.state, Posted(many));
+    SaveFormValues(session.state, Posted({{"save_a", "four"}}));
+    EXPECT_EQ(saved->size(), 200U);
+    EXPECT_EQ(saved->find("save_a")->second, "four");
 }
 
 TEST(ParseQuantity, Rows) {
