@@ -1,5 +1,6 @@
 #include "host/blocking.h"
 
+#include <cmath>
 #include <limits>
 
 #include "base/rounding.h"
@@ -17,7 +18,8 @@ constexpr std::size_t kLongestName = 200;
 bool IsBlocked(SessionState& state, const Settings& settings) {
     if (settings.Blocking <= 0) return false;
     BlockingState& blocking = state.blocking;
-    const double days = state.services.clock().days() - blocking.LastFailure.days();
+    // Either way: a clock that is put back blocks nobody until it has caught up.
+    const double days = std::abs(state.services.clock().days() - blocking.LastFailure.days());
     if (base::Rounded(days * 24 * 60, 0) > settings.Timeout) {
         blocking.FailedAttempts = 0;
         blocking.Blocked = false;
