@@ -46,6 +46,7 @@ int PrintTexts(const fs::path& templates) {
     const auto texts = TextsOf(templates);
     // In the order of the files, as translators read them.
     std::vector<std::pair<Places, std::string_view>> in_order;
+    in_order.reserve(texts.size());
     for (const auto& [message, places] : texts) in_order.emplace_back(places, message);
     std::sort(in_order.begin(), in_order.end());
     std::cout << kHead;
