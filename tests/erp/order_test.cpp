@@ -157,6 +157,14 @@ TEST_P(OrderTest, LinkedFieldsOfAllRowsComeTogether) {
     EXPECT_EQ(ErrorOf([&] { rows->Item(1)->GetField("Nothing.Name"); }), kStatementFailed);
 }
 
+TEST_P(OrderTest, RowsHaveAnEnd) {
+    Add(1, 1);
+    const auto rows = order_->Rows();
+    while (rows->Count() < 2000) rows->AddRow();
+    EXPECT_EQ(ErrorOf([&] { rows->AddRow(); }), base::errors::kInvalidCall);
+    EXPECT_EQ(rows->Count(), 2000);
+}
+
 TEST_P(OrderTest, RefusedRowValuesLeaveTheRowAsItWas) {
     const auto row = Add(2, 3);
     const struct {

@@ -8,8 +8,8 @@
 #include <sstream>
 #include <stdexcept>
 
-#include "erp/sqlite/backend.h"
 #include "erp/links_by_name.h"
+#include "erp/sqlite/backend.h"
 #include "tests/support/source_folder.h"
 
 namespace zebtell::erp {
