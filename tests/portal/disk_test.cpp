@@ -1,5 +1,7 @@
 #include <gmock/gmock.h>
 
+#include <optional>
+
 #include "tests/portal/portal_fixture.h"
 #include "tests/portal/watched_disk.h"
 

@@ -1,6 +1,9 @@
 #include <gmock/gmock.h>
 
+#include <filesystem>
 #include <regex>
+#include <string>
+#include <vector>
 
 #include "app/pages.h"
 #include "tests/portal/portal_fixture.h"
