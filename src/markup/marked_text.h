@@ -14,7 +14,8 @@ struct MarkedText {
     std::string_view contents;
 };
 
-// The first from `from` on that has its end and a text; those inside of it are part of its contents.
+// The first from `from` on that has its end and a text; those inside of it are part of its
+// contents.
 std::optional<MarkedText> FindMarkedText(std::string_view text, std::size_t from);
 
 // What a catalogue knows the text by: without white space around it, and with one blank for each
