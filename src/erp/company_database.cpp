@@ -1,7 +1,7 @@
 #include "erp/company_database.h"
 
-#include "erp/sql/errors.h"
 #include "erp/links_by_name.h"
+#include "erp/sql/errors.h"
 
 namespace zebtell::erp {
 namespace {

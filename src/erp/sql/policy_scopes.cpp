@@ -15,8 +15,9 @@ struct RuleScopes {
 };
 
 ExprPtr Parsed(std::string_view scope) {
-    return scope.empty() || scope == AccessRule::kNoRows ? nullptr
-                                          : Parser(scope, Style::kPolicy).ParseCondition();
+    return scope.empty() || scope == AccessRule::kNoRows
+               ? nullptr
+               : Parser(scope, Style::kPolicy).ParseCondition();
 }
 
 std::unordered_map<const AccessRule*, RuleScopes> ParsePolicy() {
