@@ -39,6 +39,7 @@ constexpr TagContents kContents[] = {
     {"", "zeb:tellkogus"},
     {"", "zeb:tellridu"},
     {"", "zeb:weblanguage"},
+    {"", "zeb:fileversion"},
     {"", "zeb:setstoreid"},
     {"", "zeb:savevalue"},
     {"", "zeb:roundquantity"},

@@ -1,5 +1,8 @@
 #pragma once
 
+#include <functional>
+#include <string>
+
 #include "base/clock.h"
 #include "data/data_application.h"
 #include "host/logon_limits.h"
@@ -12,6 +15,8 @@ struct Services {
     SettingsStore& settings;
     data::DataApplicationFactory make_application;
     base::Clock clock;
+    // What changes with the bytes of a static file; none: nothing is known of them.
+    std::function<std::string(const std::string& name)> file_version{};
     LogonLimits logon_limits{};
 };
 

@@ -79,7 +79,7 @@ std::string ETag(std::string_view bytes) {
     std::array<char, 48> text{};
     const int size = std::snprintf(text.data(),
                                    text.size(),
-                                   "\"%llx-%zx\"",
+                                   "\"%016llx-%zx\"",
                                    static_cast<unsigned long long>(hash),
                                    bytes.size());
     return {text.data(), static_cast<std::size_t>(size)};
@@ -90,6 +90,15 @@ std::optional<std::string> ReadFile(const fs::path& path) {
     std::string bytes(std::istreambuf_iterator<char>(in), {});
     if (!in || bytes.size() > kMaxBytes) return {};
     return bytes;
+}
+
+std::string_view VersionIn(std::string_view etag) {
+    return etag.substr(1, 8);
+}
+
+std::string_view CacheControl(std::string_view query, std::string_view etag) {
+    const bool is_of_version = query.starts_with("v=") && query.substr(2) == VersionIn(etag);
+    return is_of_version ? "public, max-age=31536000, immutable" : "public, max-age=3600";
 }
 
 bool IsText(std::string_view content_type) {
@@ -126,13 +135,17 @@ std::optional<Response> StaticFiles::Serve(const Request& request) {
     const std::string_view path = request.Path();
     if (!path.starts_with(prefix_)) return {};
     if (request.method != "GET" && request.method != "HEAD") return ErrorResponse(405);
-    const std::string name = DecodePath(path.substr(prefix_.size()));
-    const bool may_be_asked_for = IsPlainName(name) && !ContentType(name).empty();
-    const FilePointer file = may_be_asked_for ? Find(name) : nullptr;
+    const FilePointer file = Find(DecodePath(path.substr(prefix_.size())));
     return file ? Answer(request, file) : ErrorResponse(404);
 }
 
+std::string StaticFiles::Version(const std::string& name) {
+    const FilePointer file = Find(name);
+    return file ? std::string(VersionIn(file->etag)) : std::string();
+}
+
 StaticFiles::FilePointer StaticFiles::Find(const std::string& name) {
+    if (!IsPlainName(name) || ContentType(name).empty()) return nullptr;
     const auto now = Clock::now();
     FilePointer known;
     {
@@ -187,7 +200,7 @@ Response StaticFiles::Answer(const Request& request, const FilePointer& file) {
     if (file->BytesIn(coding).empty()) coding = Coding::kIdentity;
     const std::string etag = TagIn(file->etag, coding);
     Response response;
-    response.headers = {{"Cache-Control", "public, max-age=3600"},
+    response.headers = {{"Cache-Control", std::string(CacheControl(request.Query(), file->etag))},
                         {"ETag", etag},
                         {"Last-Modified", FormatHttpDate(file->modified)}};
     if (!file->gzip.empty()) response.headers.emplace_back("Vary", "Accept-Encoding");

@@ -29,7 +29,11 @@ class StaticFiles {
     StaticFiles(std::vector<std::filesystem::path> folders, std::string prefix);
 
     // The answer to a request for a path under the prefix, nothing for other paths.
+    // One that names the file's version (?v=...) may be kept for a year, others for an hour.
     std::optional<Response> Serve(const Request& request);
+
+    // What changes with the bytes of a file, for its address; "" when there is no such file.
+    std::string Version(const std::string& name);
 
   private:
     using Clock = std::chrono::steady_clock;

@@ -59,6 +59,14 @@ bool Text(TagCall& call) {
     return kHandled;
 }
 
+// In a file's address, so that browsers keep it until it changes.
+bool FileVersion(TagCall& call) {
+    const auto& version = call.state.services.file_version;
+    const std::string name(base::Trimmed(call.tag.TemplateContents()));
+    call.tag.Write(version ? version(name) : std::string());
+    return kHandled;
+}
+
 bool LogonPWD(TagCall& call) {
     ShowIf(call, !IDCardLogon);
     return kHandled;
@@ -142,6 +150,9 @@ const TagTable& CommonTagTable() {
         {"ZEB:WEBLanguage", WEBLanguage, "Sets the page's language"},
         {"ZEB:Lang", Lang, "Code of the language that the page is in: et, en, lv"},
         {"ZEB:Text", Text, "Contents in the language of the page"},
+        {"ZEB:FileVersion",
+         FileVersion,
+         "What changes with the static file named, for its address"},
         {"ZEB:LogonPWD", LogonPWD, "Contents when users log on with a password"},
         {"ZEB:LogonEID", LogonEID, "Contents when users log on with an ID card"},
         {"ZEB:CreateCombo",

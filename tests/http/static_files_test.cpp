@@ -97,6 +97,19 @@ TEST_F(StaticFilesTest, AnswersWhetherACopyIsStillGood) {
     }
 }
 
+TEST_F(StaticFilesTest, LetsAnAddressWithItsVersionBeKept) {
+    const auto kept = [&](const std::string& query) {
+        return HeaderOf(*Ask("/static/css/style.css" + query), "Cache-Control");
+    };
+    const std::string version = files_.Version("css/style.css");
+    EXPECT_EQ(version.size(), 8U);
+    EXPECT_EQ(kept("?v=" + version), "public, max-age=31536000, immutable");
+    EXPECT_EQ(kept("?v=0" + version), "public, max-age=3600");
+    EXPECT_EQ(kept("?v="), "public, max-age=3600");
+    EXPECT_EQ(files_.Version("page.htm"), "");
+    EXPECT_EQ(files_.Version("../outside.css"), "");
+}
+
 TEST_F(StaticFilesTest, PacksTextsForThoseWhoTakeIt) {
     const std::string style(5000, 's');
     Write("site/long.css", style);
