@@ -36,8 +36,8 @@ std::shared_ptr<data::Record> Application::Logon(data::DatabaseType type,
                                                  std::string_view user,
                                                  std::string_view password) {
     session_.reset();
-    auto database = find_database_(type, std::string(path));
-    Reader reader = LogOn(*database, user, password);
+    const DatabaseAddress address = AddressFor(type, path, user, password);
+    auto [database, reader] = LogOnTo(address, user, password);
     reader.role = RoleOf(reader.role == Role::kGuest ? guest_role_ : user_role_);
     const std::int64_t id = reader.user;
     auto session = std::make_shared<Session>(std::move(database), std::move(reader), clock_);
@@ -47,6 +47,23 @@ std::shared_ptr<data::Record> Application::Logon(data::DatabaseType type,
     }
     session_ = std::move(session);
     return record;
+}
+
+std::pair<std::shared_ptr<CompanyDatabase>, Reader> Application::LogOnTo(
+    const DatabaseAddress& address, std::string_view user, std::string_view password) {
+    if (!address.is_users_own) {
+        auto database = find_database_(address);
+        Reader reader = LogOn(*database, user, password);
+        return {std::move(database), std::move(reader)};
+    }
+    try {
+        auto database = find_database_(address);
+        database->pool().Renew();
+        Reader reader = LogOnOfDatabase(*database, user);
+        return {std::move(database), std::move(reader)};
+    } catch (const LoginRefused&) {
+        FailLogOn();
+    }
 }
 
 std::shared_ptr<data::Record> Application::Load(std::string_view table, std::int64_t id) {

@@ -3,14 +3,15 @@
 #include <functional>
 #include <memory>
 #include <string>
+#include <utility>
 
 #include "data/data_application.h"
+#include "erp/database.h"
 #include "erp/session.h"
 
 namespace zebtell::erp {
 
-using FindDatabase =
-    std::function<std::shared_ptr<CompanyDatabase>(data::DatabaseType, const std::string& path)>;
+using FindDatabase = std::function<std::shared_ptr<CompanyDatabase>(const DatabaseAddress&)>;
 
 // One session's way to the company database.
 class Application : public data::DataApplication {
@@ -38,6 +39,10 @@ class Application : public data::DataApplication {
   private:
     // RuntimeError 91 before the log-on.
     const std::shared_ptr<Session>& session() const;
+
+    std::pair<std::shared_ptr<CompanyDatabase>, Reader> LogOnTo(const DatabaseAddress& address,
+                                                                std::string_view user,
+                                                                std::string_view password);
 
     FindDatabase find_database_;
     base::Clock clock_;

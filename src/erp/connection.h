@@ -32,6 +32,12 @@ class TransientError : public base::RuntimeError {
     Kind kind_;
 };
 
+// The database refuses the name or the password that a connection is made with.
+class LoginRefused : public base::RuntimeError {
+  public:
+    LoginRefused() : RuntimeError(base::errors::kUnspecified, "The database refuses the log-on") {}
+};
+
 // The result of a statement, read row by row. It frees its statement when it is destroyed and does
 // not outlive its connection.
 class Cursor {

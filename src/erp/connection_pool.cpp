@@ -107,6 +107,11 @@ void ConnectionPool::CloseIdle() {
     closed.swap(readers_);
 }
 
+void ConnectionPool::Renew() {
+    CloseIdle();
+    Read();
+}
+
 std::int64_t ConnectionPool::DataVersion() {
     const auto now = steady_clock::now();
     if (looked_writes_ == writes_ && now - looked_.load() < kLookTime) {

@@ -70,6 +70,9 @@ class ConnectionPool {
         return read(*connection);
     }
 
+    // Makes a new connection, which shows whether the database still takes the log-on.
+    void Renew();
+
     // Grows whenever something has been committed: at once for what a Lease of this pool has
     // written, soon for what others have (SQLite: within a millisecond).
     std::int64_t DataVersion();

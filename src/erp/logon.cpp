@@ -81,21 +81,41 @@ std::vector<std::int64_t> WithSourceLists(Connection& connection,
     return lists;
 }
 
-}  // namespace
+std::optional<User> FindUser(CompanyDatabase& database, std::string_view name) {
+    return database.pool().Reading(
+        [name](Connection& connection) { return FindUser(connection, name); });
+}
 
-Reader LogOn(CompanyDatabase& database, std::string_view user, std::string_view password) {
-    const auto found = database.pool().Reading(
-        [user](Connection& connection) { return FindUser(connection, user); });
-    const bool right = IsPassword(password, found ? found->hash : std::string());
-    if (!right || found->disabled) {
-        throw base::RuntimeError(base::errors::kLogonFailed, "Unknown user or wrong password");
-    }
-    Reader reader = found->reader;
+Reader WithPriceLists(CompanyDatabase& database, const User& user) {
+    Reader reader = user.reader;
     const auto lists =
-        found->price_list != 0 ? std::vector{found->price_list} : DefaultPriceLists(database);
+        user.price_list != 0 ? std::vector{user.price_list} : DefaultPriceLists(database);
     reader.price_lists = database.pool().Reading(
         [&lists](Connection& connection) { return WithSourceLists(connection, lists); });
     return reader;
+}
+
+}  // namespace
+
+Reader LogOn(CompanyDatabase& database, std::string_view user, std::string_view password) {
+    const std::optional<User> found = FindUser(database, user);
+    const bool right = IsPassword(password, found ? found->hash : std::string());
+    if (!right || found->disabled) {
+        FailLogOn();
+    }
+    return WithPriceLists(database, *found);
+}
+
+Reader LogOnOfDatabase(CompanyDatabase& database, std::string_view user) {
+    const std::optional<User> found = FindUser(database, user);
+    if (!found || found->disabled) {
+        FailLogOn();
+    }
+    return WithPriceLists(database, *found);
+}
+
+void FailLogOn() {
+    throw base::RuntimeError(base::errors::kLogonFailed, "Unknown user or wrong password");
 }
 
 std::vector<std::int64_t> DefaultPriceLists(CompanyDatabase& database) {

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <concepts>
 #include <exception>
 #include <string>
 #include <string_view>
@@ -17,7 +18,8 @@ void LogHandlerError(const SessionState& state,
                      const std::exception& error);
 
 // The one place where a page's handlers catch: runs `work`; an error is logged under the handler's
-// name, then `instead` runs. Returns whether the work came to its end.
+// name, then `instead` runs, with the error when it takes one. Returns whether the work came to its
+// end.
 template <class Work, class Instead>
 bool Guarded(SessionState& state, std::string_view handler, Work&& work, Instead&& instead) {
     try {
@@ -25,7 +27,11 @@ bool Guarded(SessionState& state, std::string_view handler, Work&& work, Instead
         return true;
     } catch (const std::exception& error) {
         LogHandlerError(state, handler, error);
-        instead();
+        if constexpr (std::invocable<Instead, const std::exception&>) {
+            instead(error);
+        } else {
+            instead();
+        }
         return false;
     }
 }

@@ -1,6 +1,7 @@
 #include "host/logon.h"
 
 #include "base/rounding.h"
+#include "base/runtime_error.h"
 #include "base/text.h"
 #include "host/blocking.h"
 #include "host/errors.h"
@@ -16,6 +17,12 @@ using data::Record;
 constexpr LocalText kInvalid = {"Vale kasutajanimi või parool!",
                                 "Invalid user name or password!",
                                 "Nederīgs lietotājvārds vai parole!"};
+
+// Nobody's fault who logs on, so it does not count as an attempt.
+constexpr LocalText kNotAvailable = {
+    "Teenus ei ole praegu kättesaadav, palun proovige mõne aja pärast uuesti!",
+    "The service is not available at the moment, please try again later!",
+    "Pakalpojums pašlaik nav pieejams, lūdzu, mēģiniet vēlāk!"};
 
 struct Credentials {
     std::string user;
@@ -119,6 +126,11 @@ bool MayTry(SessionState& state,
     return false;
 }
 
+// The database is not there, is busy or refuses the portal.
+bool IsDatabaseProblem(const std::exception& error) {
+    return base::AsRuntimeError(error).number() == base::errors::kUnspecified;
+}
+
 void GoOn(SessionState& state, web::Call& call) {
     const std::string page = std::exchange(state.logon.ReturnPage, {});
     call.RedirectTo(page.empty() ? "Raamistik" : std::string_view(page));
@@ -155,9 +167,13 @@ void Logon_Logon(SessionState& state, web::Call& call) {
         ResetUserState(state);
     }
     if (!MayTry(state, call.request, *settings, credentials)) return call.RedirectTo("Logon");
-    const auto refuse = [&] {
-        CountFailure(state, *settings, credentials.user);
-        state.Message = kInvalid.In(settings->language());
+    const auto refuse = [&](const std::exception& error) {
+        if (IsDatabaseProblem(error)) {
+            state.Message = kNotAvailable.In(settings->language());
+        } else {
+            CountFailure(state, *settings, credentials.user);
+            state.Message = kInvalid.In(settings->language());
+        }
         call.RedirectTo("Logon");
     };
     const auto enter = [&] {

@@ -46,7 +46,7 @@ TEST_F(BrokenSurroundings, DatabaseMissingOrDamaged) {
     const auto expect_no_service = [&] {
         Browser browser = NewBrowser();
         EXPECT_THAT(browser.LogOn("mari", "mari-sala"),
-                    HasSubstr("(Vale kasutajanimi või parool!)"));
+                    HasSubstr("(Teenus ei ole praegu kättesaadav, palun proovige mõne aja"));
         EXPECT_EQ(browser.Ask("/healthz", "GET", "").status, 503);
     };
     Start(kUsualSettings);
@@ -60,6 +60,19 @@ TEST_F(BrokenSurroundings, DatabaseMissingOrDamaged) {
     std::filesystem::rename(folder.path() / "away.db", database);
     EXPECT_THAT(MariLoggedOn().Get("Kaubainfo"), HasSubstr("[kaubad"));
     EXPECT_EQ(NewBrowser().Ask("/healthz", "GET", "").status, 200);
+}
+
+// Nothing listens at the port. Whoever tries to log on is not blocked for it.
+TEST_F(BrokenSurroundings, ServerOfTheDatabaseMissing) {
+    const std::string driver = std::string("Driver=") + ZEBTELL_FREETDS_ODBC;
+    StartOn("Type=MSSQL\r\nPath=" + driver + ";Server=127.0.0.1;Port=1;UID=portal;PWD=x",
+            "[Session]\r\nBlocking=1\r\nTimeout=5\r\n");
+    Browser browser = NewBrowser();
+    for (int i = 0; i < 3; ++i) {
+        EXPECT_THAT(browser.LogOn("mari", "mari-sala"),
+                    HasSubstr("(Teenus ei ole praegu kättesaadav, palun proovige mõne aja"));
+    }
+    EXPECT_EQ(browser.Ask("/healthz", "GET", "").status, 503);
 }
 
 TEST_F(BrokenSurroundings, LogThatCannotBeWritten) {

@@ -76,10 +76,13 @@ class PortalTest : public ::testing::Test {
 
     // Starts the portal anew, with further settings.
     void Start(const std::string& settings) {
+        StartOn("Path=" + (folder.path() / "company.db").string(), settings);
+    }
+    // The same with another database.
+    void StartOn(const std::string& database, const std::string& settings) {
         portal.reset();
         folder.Write("ZEBTell.ini",
-                     "[DataBase]\r\nPath=" + (folder.path() / "company.db").string() +
-                         "\r\n[WEBLog]\r\nLevel=Detail\r\n" + settings);
+                     "[DataBase]\r\n" + database + "\r\n[WEBLog]\r\nLevel=Detail\r\n" + settings);
         host::ServerSettings server;
         server.Port = 0;
         server.Threads = 4;

@@ -16,7 +16,6 @@ namespace zebtell::erp::odbc {
 namespace {
 
 using base::errors::kInvalidCall;
-using base::errors::kLogonFailed;
 using base::errors::kNoSuchTable;
 using base::errors::kStatementFailed;
 using base::errors::kUnspecified;
@@ -27,7 +26,7 @@ struct Diagnostic {
     std::string words;
 };
 
-enum class Effect { kNone, kBroken, kLost, kDeadlock };
+enum class Effect { kNone, kBroken, kLost, kDeadlock, kLoginRefused };
 
 // What a native error of SQL Server means, or a state (or how it begins) of any driver. The first
 // row that fits counts.
@@ -41,7 +40,6 @@ struct Meaning {
 
 constexpr const char* kLost = "The connection to the database was lost";
 constexpr const char* kBusy = "The database is busy";
-constexpr const char* kLogon = "The database refuses the log-on";
 constexpr const char* kRights = "The portal's database user may not do that";
 constexpr const char* kConflict = "The record conflicts with another one";
 constexpr const char* kFull = "There is no room left for the company database";
@@ -50,15 +48,15 @@ constexpr const char* kTooLong = "A text is longer than its column";
 constexpr Meaning kMeanings[] = {
     {1205, "", kUnspecified, Effect::kDeadlock, kBusy},
     {1222, "", kUnspecified, Effect::kNone, kBusy},
-    {18456, "", kLogonFailed, Effect::kBroken, kLogon},
-    {18452, "", kLogonFailed, Effect::kBroken, kLogon},
-    {18470, "", kLogonFailed, Effect::kBroken, kLogon},  // disabled
-    {18486, "", kLogonFailed, Effect::kBroken, kLogon},  // locked out
-    {18487, "", kLogonFailed, Effect::kBroken, kLogon},  // password expired
-    {18488, "", kLogonFailed, Effect::kBroken, kLogon},  // password must be changed
+    {18456, "", kUnspecified, Effect::kLoginRefused, ""},
+    {18452, "", kUnspecified, Effect::kLoginRefused, ""},
+    {18470, "", kUnspecified, Effect::kLoginRefused, ""},  // disabled
+    {18486, "", kUnspecified, Effect::kLoginRefused, ""},  // locked out
+    {18487, "", kUnspecified, Effect::kLoginRefused, ""},  // password expired
+    {18488, "", kUnspecified, Effect::kLoginRefused, ""},  // password must be changed
     {4060, "", kUnspecified, Effect::kBroken, "The company database is not there"},
-    {229, "", kStatementFailed, Effect::kNone, kRights},
-    {230, "", kStatementFailed, Effect::kNone, kRights},
+    {229, "", kUnspecified, Effect::kNone, kRights},
+    {230, "", kUnspecified, Effect::kNone, kRights},
     {1105, "", kUnspecified, Effect::kNone, kFull},
     {9002, "", kUnspecified, Effect::kNone, kFull},
     {3906, "", kStatementFailed, Effect::kNone, "The database may not be written to"},
@@ -66,14 +64,14 @@ constexpr Meaning kMeanings[] = {
     {8152, "", kInvalidCall, Effect::kNone, kTooLong},
     {0, "40001", kUnspecified, Effect::kDeadlock, kBusy},
     {0, "40P01", kUnspecified, Effect::kDeadlock, kBusy},
-    {0, "28", kLogonFailed, Effect::kBroken, kLogon},
+    {0, "28", kUnspecified, Effect::kLoginRefused, ""},
     {0, "HYT", kStatementFailed, Effect::kBroken, "The statement took too long"},
     {0, "57014", kStatementFailed, Effect::kBroken, "The statement took too long"},
     {0, "08", kUnspecified, Effect::kLost, kLost},
     {0, "57P", kUnspecified, Effect::kLost, kLost},  // the server is being shut down
     {0, "22001", kInvalidCall, Effect::kNone, kTooLong},
     {0, "23", kStatementFailed, Effect::kNone, kConflict},
-    {0, "42501", kStatementFailed, Effect::kNone, kRights},
+    {0, "42501", kUnspecified, Effect::kNone, kRights},
     {0, "25006", kStatementFailed, Effect::kNone, "The database may not be written to"},
     {0, "55P03", kUnspecified, Effect::kNone, kBusy},
     {0, "42S02", kNoSuchTable, Effect::kNone, ""},
@@ -140,6 +138,8 @@ std::string_view Quoted(std::string_view words, std::string_view behind) {
             throw TransientError(TransientError::Kind::kConnectionLost, meaning.description);
         case Effect::kDeadlock:
             throw TransientError(TransientError::Kind::kDeadlock, meaning.description);
+        case Effect::kLoginRefused:
+            throw LoginRefused();
         default:
             break;
     }
@@ -171,7 +171,7 @@ void Fail(Link& link, SQLSMALLINT type, SQLHANDLE handle) {
     if ((!found || found->effect == Effect::kNone) && IsDead(link.handle)) {
         found = &kDead;
     }
-    link.broken |= found && (found->effect == Effect::kBroken || found->effect == Effect::kLost);
+    link.broken |= found && found->effect != Effect::kNone && found->effect != Effect::kDeadlock;
     if (found) {
         FailWith(*found, WordsOf(diagnostics));
     }
@@ -181,8 +181,8 @@ void Fail(Link& link, SQLSMALLINT type, SQLHANDLE handle) {
 void FailToConnect(SQLHDBC handle) {
     for (const Diagnostic& diagnostic : Diagnostics(SQL_HANDLE_DBC, handle)) {
         const Meaning* meaning = MeaningOf(diagnostic);
-        if (meaning && (meaning->number == kLogonFailed || meaning->native != 0)) {
-            throw base::RuntimeError(meaning->number, meaning->description);
+        if (meaning && (meaning->effect == Effect::kLoginRefused || meaning->native != 0)) {
+            FailWith(*meaning, "");
         }
     }
     throw base::RuntimeError(kUnspecified, "The database server does not answer");
