@@ -2,13 +2,15 @@
 
 #include <gtest/gtest.h>
 
-#include <fstream>
+#include <cstdlib>
 
+#include "base/ignore_errors.h"
 #include "base/runtime_error.h"
 #include "erp/password.h"
 #include "erp/sqlite/backend.h"
 #include "tests/erp/odbc_sqlite.h"
 #include "tests/erp/sqlite_file.h"
+#include "tests/support/server_company.h"
 #include "tests/support/server_sql_recorder.h"
 
 namespace zebtell::erp {
@@ -109,6 +111,30 @@ class OdbcSqliteCompany : public SqliteCompany {
     OdbcSqlite database_;
 };
 
+// A database of a real server, which holds nothing else; each test fills it anew.
+class ServerCompany : public SqliteCompany {
+  public:
+    explicit ServerCompany(std::string path) : path_(std::move(path)) {
+        const auto server = MakeBackend();
+        DropCompany(*server);
+        CopyCompany(Original(), *server);
+    }
+    ~ServerCompany() override {
+        base::IgnoreErrors([this] { DropCompany(*MakeBackend()); });
+    }
+    ServerCompany(const ServerCompany&) = delete;
+    ServerCompany& operator=(const ServerCompany&) = delete;
+
+    data::DatabaseType type() const override { return data::DatabaseType::kSqlServer; }
+    std::string path() const override { return path_; }
+    std::unique_ptr<Backend> MakeBackend() const override {
+        return erp::MakeBackend(type(), path_);
+    }
+
+  private:
+    std::string path_;
+};
+
 }  // namespace
 
 void Watch::Statement() {
@@ -139,8 +165,15 @@ std::string Company::Show(const std::string& sql) const {
 }
 
 std::vector<DatabaseKind> DatabaseKinds() {
-    return {{"Sqlite", [] { return std::make_unique<SqliteCompany>(); }},
-            {"OdbcSqlite", [] { return std::make_unique<OdbcSqliteCompany>(); }}};
+    std::vector<DatabaseKind> kinds = {
+        {"Sqlite", [] { return std::make_unique<SqliteCompany>(); }}};
+    if (OdbcSqlite::IsInstalled()) {
+        kinds.push_back({"OdbcSqlite", [] { return std::make_unique<OdbcSqliteCompany>(); }});
+    }
+    if (const char* path = std::getenv("ZEBTELL_TEST_ODBC")) {
+        kinds.push_back({"SqlServer", [path] { return std::make_unique<ServerCompany>(path); }});
+    }
+    return kinds;
 }
 
 PortalTest::PortalTest() : company_(GetParam().make()) {

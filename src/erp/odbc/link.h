@@ -15,7 +15,7 @@ struct ConnectionLimits {
 
 // A connection's handle with what its statements have to know.
 struct Link {
-    const ServerKind& kind;
+    ServerKind kind;
     ConnectionLimits limits;
     SQLHDBC handle;
     bool broken = false;  // lost, or may still be busy with something

@@ -23,7 +23,7 @@ std::string Escaped(char byte) {
         case '\'':
             return "&#39;";
         default:
-            return {1, byte};
+            return std::string(1, byte);
     }
 }
 
