@@ -5,6 +5,9 @@
 namespace zebtell::catalogue {
 namespace {
 
+using data::Filter;
+using data::Typed;
+
 constexpr std::string_view kLinesOfList =
     "GRPriceListRel.ID IN (select P5.ID from SQPriceList5 P5 inner join GRArticle on "
     "P5.IDGRArticle=GRArticle.ID";
@@ -26,25 +29,25 @@ std::string FilterPart(const ListRequest& request) {
 }
 
 // "(GRArticle.code like 'M6*' or GRArticle.name like '*M6*')"
-std::string SearchCondition(const ListRequest& request) {
+Filter SearchCondition(const ListRequest& request) {
     const SearchPatterns patterns = PatternsFor(request.find);
-    return "(GRArticle." + request.SearchCodeColumn + " like '" + patterns.code +
-           "' or GRArticle." + request.SearchNameColumn + " like '" + patterns.name + "')";
+    return "(GRArticle." + Filter(request.SearchCodeColumn) + " like '" + Typed{patterns.code} +
+           "' or GRArticle." + request.SearchNameColumn + " like '" + Typed{patterns.name} + "')";
 }
 
 // For customers without a price list: the runtime's own syntax, unless the template's condition is
 // SQL, which makes the whole SQL.
-std::string RuntimeFilter(const ListRequest& request, const std::string& condition) {
+Filter RuntimeFilter(const ListRequest& request, const Filter& condition) {
     if (request.FilterText.empty()) return condition;
-    const std::string both = std::string(WithoutBraces(request.FilterText)) + " and " + condition;
+    const Filter both = Filter(WithoutBraces(request.FilterText)) + " and " + condition;
     return IsSql(request.FilterText) ? "{" + both + "}" : both;
 }
 
-std::string SearchedLines(const ListRequest& request, std::string_view opening) {
+Filter SearchedLines(const ListRequest& request, std::string_view opening) {
     const SearchPatterns patterns = PatternsFor(request.find);
-    return std::string(opening) + std::string(kLinesOfList) + " where (GRArticle." +
-           request.SearchNameColumn + " LIKE '" + patterns.name + "' OR GRArticle." +
-           request.SearchCodeColumn + " LIKE '" + patterns.code + "')" + FilterPart(request) +
+    return Filter(opening) + kLinesOfList + " where (GRArticle." + request.SearchNameColumn +
+           " LIKE '" + Typed{patterns.name} + "' OR GRArticle." + request.SearchCodeColumn +
+           " LIKE '" + Typed{patterns.code} + "')" + FilterPart(request) +
            " AND (IDGRPriceList=" + std::to_string(request.PriceListId) + "))}";
 }
 
@@ -59,32 +62,33 @@ SearchPatterns PatternsFor(std::string_view find) {
     return {"*" + words + "*", words + "*"};
 }
 
-std::string FavouritesCriterion(std::int32_t price_list, std::string_view favourites) {
-    if (price_list == 0) return std::string(favourites);
-    std::string criterion = "{" + std::string(kLinesOfList) +
-                            " where IDGRPriceList=" + std::to_string(price_list) + ")";
-    if (!favourites.empty()) criterion += " AND " + std::string(favourites);
+Filter FavouritesCriterion(std::int32_t price_list, std::string_view favourites) {
+    if (price_list == 0) return favourites;
+    Filter criterion =
+        "{" + Filter(kLinesOfList) + " where IDGRPriceList=" + std::to_string(price_list) + ")";
+    if (!favourites.empty()) criterion += " AND " + Filter(favourites);
     return criterion + "}";
 }
 
-std::string CategoryCriterion(const ListRequest& request) {
+Filter CategoryCriterion(const ListRequest& request) {
     if (request.category.empty()) {
         return request.PriceListId == 0 ? RuntimeFilter(request, SearchCondition(request))
                                         : SearchedLines(request, "{GRPriceListRel.Price<>0 AND ");
     }
-    const std::string search = request.find.empty() ? "" : " and " + SearchCondition(request);
+    const Filter search = request.find.empty() ? "" : " and " + SearchCondition(request);
     if (request.PriceListId == 0) {
-        return RuntimeFilter(
-            request,
-            "GRArticle.GRArticleCatRel.IDGRArticleCat IN (" + request.category + ")" + search);
+        return RuntimeFilter(request,
+                             "GRArticle.GRArticleCatRel.IDGRArticleCat IN (" +
+                                 Filter(Typed{request.category}) + ")" + search);
     }
     return "{GRPriceListRel.Price<>0 AND GRPriceListRel.ID IN (select ID from SQCatPriceList5 "
            "where (IDGRArticleCat IN (" +
-           request.category + ")) AND (IDGRPriceList=" + std::to_string(request.PriceListId) +
-           "))" + search + FilterPart(request) + "}";
+           Filter(Typed{request.category}) +
+           ")) AND (IDGRPriceList=" + std::to_string(request.PriceListId) + "))" + search +
+           FilterPart(request) + "}";
 }
 
-std::string SearchCriterion(const ListRequest& request) {
+Filter SearchCriterion(const ListRequest& request) {
     return request.PriceListId == 0 ? RuntimeFilter(request, SearchCondition(request))
                                     : SearchedLines(request, "{");
 }

@@ -15,7 +15,8 @@ using host::SessionState;
 
 std::shared_ptr<data::Record> ReadArticle(SessionState& state, const std::string& id) {
     if (!base::ParseNumber(id)) return nullptr;
-    const auto list = state.application().OpenList("GRArticle", "ID=" + id, "");
+    const auto list =
+        state.application().OpenList("GRArticle", "ID=" + data::Filter(data::Typed{id}), "");
     return list->Count() == 0 ? nullptr : list->Item(1);
 }
 

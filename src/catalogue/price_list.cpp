@@ -37,7 +37,7 @@ void ReadPrices(SessionState& state, std::int64_t row) {
 
 }  // namespace
 
-void OpenList(SessionState& state, const std::string& criterion) {
+void OpenList(SessionState& state, const data::Filter& criterion) {
     CatalogueState& catalogue = state.catalogue;
     const std::string_view order =
         catalogue.OrderText.empty() ? kUsualOrder : std::string_view(catalogue.OrderText);

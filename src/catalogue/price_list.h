@@ -10,7 +10,7 @@ namespace zebtell::catalogue {
 
 // Opens the customer's price lines for a criterion, sorted as the catalogue is, and starts at its
 // first page. When that fails the list that was there stays.
-void OpenList(host::SessionState& state, const std::string& criterion);
+void OpenList(host::SessionState& state, const data::Filter& criterion);
 
 // "FirstPage", "PrevPage", "NextPage", "LastPage"; other commands and lists of one page leave the
 // page as it is.

@@ -7,6 +7,7 @@
 #include <string_view>
 
 #include "data/document.h"
+#include "data/filter.h"
 #include "data/record.h"
 #include "data/record_list.h"
 
@@ -43,15 +44,14 @@ class DataApplication {
     // own filter syntax, or empty; `order` is columns or dotted paths, each with an optional
     // "asc" or "desc", separated by commas, or empty.
     virtual std::shared_ptr<RecordList> OpenList(std::string_view table,
-                                                 std::string_view filter,
+                                                 const Filter& filter,
                                                  std::string_view order) = 0;
 
     // The result of a select statement. The two numbers are kept for the runtime and are 0.
     virtual std::shared_ptr<RecordList> OpenQuery(std::string_view sql, int, int) = 0;
 
     // The table's documents for editing.
-    virtual std::shared_ptr<Table> OpenTable(std::string_view table,
-                                             std::string_view filter = {}) = 0;
+    virtual std::shared_ptr<Table> OpenTable(std::string_view table, const Filter& filter = {}) = 0;
 
     // The ID of the record of `linked` that new documents of `table` use by default, 0 for none:
     // DefaultLink("SDOrder", "GRPriceList").

@@ -10,8 +10,8 @@ namespace {
 
 constexpr std::size_t kPrefixLength = 3;  // "ID=" or "ID_"
 
-std::string IdFilter(std::string_view filter) {
-    return "ID=" + std::string(filter.substr(std::min(kPrefixLength, filter.size())));
+Filter IdFilter(std::string_view filter) {
+    return "ID=" + Filter(Typed{filter.substr(std::min(kPrefixLength, filter.size()))});
 }
 
 std::int16_t CountOf(RecordList& list) {

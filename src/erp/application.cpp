@@ -71,7 +71,7 @@ std::shared_ptr<data::Record> Application::Load(std::string_view table, std::int
 }
 
 std::shared_ptr<data::RecordList> Application::OpenList(std::string_view table,
-                                                        std::string_view filter,
+                                                        const data::Filter& filter,
                                                         std::string_view order) {
     return OpenKeyedList(session(), session()->database().Table(table), filter, order);
 }
@@ -81,7 +81,7 @@ std::shared_ptr<data::RecordList> Application::OpenQuery(std::string_view sql, i
 }
 
 std::shared_ptr<data::Table> Application::OpenTable(std::string_view table,
-                                                    std::string_view filter) {
+                                                    const data::Filter& filter) {
     return OpenDocumentTable(session(), session()->database().Table(table), filter);
 }
 
@@ -94,11 +94,8 @@ std::int64_t Application::DefaultLink(std::string_view table, std::string_view l
     if (!target.FindColumn("IsDefault")) {
         return 0;
     }
-    return session()->database().pool().Reading([&target](Connection& connection) {
-        const auto row =
-            connection.Query({"SELECT min(ID) FROM " + target.name + " WHERE IsDefault = 1", {}});
-        return row->Next() ? row->GetInteger(0) : 0;
-    });
+    const auto keys = session()->Keys(target, "IsDefault=1", "ID");
+    return keys->count() == 0 ? 0 : keys->Get(0, 0);
 }
 
 const std::shared_ptr<Session>& Application::session() const {

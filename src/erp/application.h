@@ -29,11 +29,11 @@ class Application : public data::DataApplication {
                                         std::string_view password) override;
     std::shared_ptr<data::Record> Load(std::string_view table, std::int64_t id) override;
     std::shared_ptr<data::RecordList> OpenList(std::string_view table,
-                                               std::string_view filter,
+                                               const data::Filter& filter,
                                                std::string_view order) override;
     std::shared_ptr<data::RecordList> OpenQuery(std::string_view sql, int, int) override;
     std::shared_ptr<data::Table> OpenTable(std::string_view table,
-                                           std::string_view filter) override;
+                                           const data::Filter& filter) override;
     std::int64_t DefaultLink(std::string_view table, std::string_view linked) override;
 
   private:

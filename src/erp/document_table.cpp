@@ -10,8 +10,8 @@ namespace {
 
 class OrderTable : public data::Table {
   public:
-    OrderTable(std::shared_ptr<Session> session, const TableInfo& table, std::string_view filter)
-        : session_(std::move(session)), table_(table), filter_(filter) {}
+    OrderTable(std::shared_ptr<Session> session, const TableInfo& table, data::Filter filter)
+        : session_(std::move(session)), table_(table), filter_(std::move(filter)) {}
 
     std::shared_ptr<data::Document> Open(std::int64_t id) override {
         if (id == 0) {
@@ -46,14 +46,14 @@ class OrderTable : public data::Table {
 
     std::shared_ptr<Session> session_;
     const TableInfo& table_;
-    std::string filter_;
+    data::Filter filter_;
 };
 
 }  // namespace
 
 std::shared_ptr<data::Table> OpenDocumentTable(const std::shared_ptr<Session>& session,
                                                const TableInfo& table,
-                                               std::string_view filter) {
+                                               const data::Filter& filter) {
     if (!base::EqualNoCase(table.name, kOrderTable)) {
         throw base::RuntimeError(base::errors::kInvalidCall,
                                  "The documents of " + table.name + " can't be edited");

@@ -11,6 +11,6 @@ namespace zebtell::erp {
 // A table's documents for editing. RuntimeError 5 for a table that holds none.
 std::shared_ptr<data::Table> OpenDocumentTable(const std::shared_ptr<Session>& session,
                                                const TableInfo& table,
-                                               std::string_view filter);
+                                               const data::Filter& filter);
 
 }  // namespace zebtell::erp

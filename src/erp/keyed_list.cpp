@@ -118,10 +118,10 @@ std::optional<std::size_t> KeyedList::Position(std::string_view field, std::int6
 
 std::shared_ptr<data::RecordList> OpenKeyedList(const std::shared_ptr<Session>& session,
                                                 const TableInfo& table,
-                                                std::string_view filter,
+                                                const data::Filter& filter,
                                                 std::string_view order) {
     auto rows = std::make_shared<KeyedRows>(session, table, session->Keys(table, filter, order));
-    return std::make_shared<KeyedList>(std::move(rows), std::string(filter), std::string(order));
+    return std::make_shared<KeyedList>(std::move(rows), filter, std::string(order));
 }
 
 std::shared_ptr<data::Record> LoadRecord(const std::shared_ptr<Session>& session,

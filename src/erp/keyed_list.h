@@ -52,7 +52,7 @@ class KeyedRows {
 // A table's or view's records that a filter gave.
 class KeyedList : public ReadOnlyList {
   public:
-    KeyedList(std::shared_ptr<KeyedRows> rows, std::string filter, std::string order)
+    KeyedList(std::shared_ptr<KeyedRows> rows, data::Filter filter, std::string order)
         : rows_(std::move(rows)), filter_(std::move(filter)), order_(std::move(order)) {}
 
     std::int64_t Count() override;
@@ -63,14 +63,14 @@ class KeyedList : public ReadOnlyList {
     std::optional<std::size_t> Position(std::string_view field, std::int64_t number);
 
     std::shared_ptr<KeyedRows> rows_;
-    std::string filter_;
+    data::Filter filter_;
     std::string order_;
     std::shared_ptr<const KeyTable> find_keys_;  // read again with a column that was missing
 };
 
 std::shared_ptr<data::RecordList> OpenKeyedList(const std::shared_ptr<Session>& session,
                                                 const TableInfo& table,
-                                                std::string_view filter,
+                                                const data::Filter& filter,
                                                 std::string_view order);
 
 // The record of that key, none when the reader sees none.

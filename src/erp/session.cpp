@@ -98,7 +98,7 @@ std::string Session::TableKey(const TableInfo& table) const {
 }
 
 std::shared_ptr<const KeyTable> Session::Keys(const TableInfo& table,
-                                              std::string_view filter,
+                                              const data::Filter& filter,
                                               std::string_view order,
                                               std::string_view find_column) {
     LearnedFields& learned = database_->find_columns();

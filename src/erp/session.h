@@ -8,6 +8,7 @@
 #include <vector>
 
 #include "base/clock.h"
+#include "data/filter.h"
 #include "erp/access.h"
 #include "erp/company_database.h"
 #include "erp/key_table.h"
@@ -33,7 +34,7 @@ class Session {
     // The keys of a table's rows, with the columns that its records were looked up by so far and
     // `find_column` ("": no other).
     std::shared_ptr<const KeyTable> Keys(const TableInfo& table,
-                                         std::string_view filter,
+                                         const data::Filter& filter,
                                          std::string_view order,
                                          std::string_view find_column = {});
 

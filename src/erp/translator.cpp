@@ -16,21 +16,22 @@ namespace {
 using sql::Context;
 using sql::Style;
 
-// The condition of a filter, without the braces that mark it as SQL.
-std::string_view ConditionOf(std::string_view filter) {
+// The condition of a filter, with blanks for the braces that mark it as SQL; empty when there is
+// none.
+std::string ConditionOf(std::string filter) {
     constexpr std::string_view kBlanks = " \t\r\n";
     const std::size_t begin = filter.find_first_not_of(kBlanks);
-    if (begin == std::string_view::npos) {
+    if (begin == std::string::npos) {
         return {};
     }
-    filter = filter.substr(begin, filter.find_last_not_of(kBlanks) - begin + 1);
-    if (filter.front() != '{') {
-        return filter;
+    if (filter[begin] == '{') {
+        const std::size_t end = filter.find_last_not_of(kBlanks);
+        if (filter[end] != '}') {
+            sql::Fail("The closing brace is missing", filter);
+        }
+        filter[begin] = filter[end] = ' ';
     }
-    if (filter.back() != '}') {
-        sql::Fail("The closing brace is missing", filter);
-    }
-    return filter.substr(1, filter.size() - 2);
+    return filter;
 }
 
 sql::Path PathOf(std::string_view dotted) {
@@ -60,9 +61,11 @@ class TableSelect {
         }
     }
 
-    void AddCondition(std::string_view condition) {
-        if (!condition.empty()) {
-            const sql::ExprPtr parsed = sql::Parser(condition, Style::kFilter).ParseCondition();
+    void AddCondition(const data::Filter& filter) {
+        const std::string condition = ConditionOf(filter.text());
+        if (!base::Trimmed(condition).empty()) {
+            const sql::ExprPtr parsed =
+                sql::Parser(condition, Style::kFilter, filter.typed()).ParseCondition();
             where_.text += NextGlue();
             sql::PrintAndPart(context_, *parsed, scope_, where_);
         }
@@ -137,13 +140,13 @@ class TableSelect {
 
 BoundSql Translator::ListKeys(const Reader& reader,
                               std::string_view table,
-                              std::string_view filter,
+                              const data::Filter& filter,
                               std::string_view order,
                               std::span<const std::string> columns) const {
     return MadeFor(dialect_, [&](Dialect dialect) {
         TableSelect select(schema_, dialect, reader, table);
         select.AddFields(columns);
-        select.AddCondition(ConditionOf(filter));
+        select.AddCondition(filter);
         select.AddOrder(base::Trimmed(order));
         return select.Statement();
     });

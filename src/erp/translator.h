@@ -6,6 +6,7 @@
 #include <string_view>
 #include <vector>
 
+#include "data/filter.h"
 #include "erp/access.h"
 #include "erp/bound_sql.h"
 #include "erp/schema.h"
@@ -25,7 +26,7 @@ class Translator {
     // `columns` are columns of the table that are fetched beside the key.
     BoundSql ListKeys(const Reader& reader,
                       std::string_view table,
-                      std::string_view filter,
+                      const data::Filter& filter,
                       std::string_view order,
                       std::span<const std::string> columns) const;
 

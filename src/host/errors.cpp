@@ -25,11 +25,12 @@ std::string UserPart(const SessionState& state) {
 ErrorText DescribeError(const std::exception& error) {
     const base::RuntimeError described = base::AsRuntimeError(error);
     const bool own = dynamic_cast<const base::RuntimeError*>(&error) != nullptr;
-    // The portal's own descriptions hold no markup; a library's text may hold anything.
-    // Neither may begin what looks like another entry of the log.
+    // What the portal's own descriptions quote is escaped already; a library's text may hold
+    // anything. Neither may begin a tag, or what looks like another entry of the log.
     const std::string text = base::WithoutControls(described.description());
     return {HexNumber(described.number()) + " (" + std::to_string(described.number()) + ")",
-            own ? text : markup::Escaped(text)};
+            own ? base::Replaced(base::Replaced(text, "<", "&lt;"), ">", "&gt;")
+                : markup::Escaped(text)};
 }
 
 void WriteErrorPage(SessionState& state, web::Call& call, const std::exception& error) {

@@ -13,14 +13,16 @@ using host::SessionState;
 
 constexpr std::string_view kPrefix = "SDOrder.";
 
-// Calls `use` with the name behind "SDOrder." and the value of each such field that has one.
+// Calls `use` with the name behind "SDOrder." and the value of each such field that has one. What
+// pages keep with an order ("@...") is not for forms to set.
 template <class Use>
 void ForEachHeaderField(const web::Request& request, Use&& use) {
     for (const web::Field& field : request.Form) {
         const std::string name = tags::CleanFormValue(field.name);
         if (!base::StartsWithNoCase(name, kPrefix)) continue;
         const std::string value = tags::CleanFormValue(field.value);
-        if (!value.empty()) use(std::string_view(name).substr(kPrefix.size()), value);
+        const std::string_view header_field = std::string_view(name).substr(kPrefix.size());
+        if (!value.empty() && !header_field.starts_with('@')) use(header_field, value);
     }
 }
 

@@ -27,10 +27,6 @@ std::string Joined(const Items& items, Text&& text) {
     return joined;
 }
 
-std::string Quoted(std::string_view text) {
-    return "'" + base::Replaced(text, "'", "''") + "'";
-}
-
 Currency PostedPrice(const web::Request& request, const std::string& field) {
     const auto number = base::ParseNumber(tags::CleanFormValue(request.Form[field]));
     return number ? Currency::FromDouble(*number) : Currency();
@@ -112,14 +108,16 @@ void FindRows(SessionState& state, std::vector<Wish>& wishes) {
 
 void FindCodes(SessionState& state, std::vector<Wish>& wishes) {
     if (wishes.empty()) return;
-    const std::string list =
-        Joined(wishes, [](const Wish& wish) { return Quoted(wish.wanted.name); });
+    data::Filter list;
+    for (const Wish& wish : wishes) {
+        list += (list.empty() ? "'" : ",'") + data::Filter(data::Typed{wish.wanted.name}) + "'";
+    }
     const auto rows = state.application().OpenList(
         "GRPriceListRel",
         "{GRPriceListRel.ID in (select P5.ID from SQPriceList5 P5 inner join GRArticle on "
         "P5.IDGRArticle=GRArticle.ID where IDGRPriceList=" +
-            std::to_string(state.company.PriceListId) + " and (GRArticle.Code in (" + list +
-            ") or GRArticle.Barcode in (" + list + ")))}",
+            data::Filter(std::to_string(state.company.PriceListId)) + " and (GRArticle.Code in (" +
+            list + ") or GRArticle.Barcode in (" + list + ")))}",
         "");
     std::unordered_map<std::string, std::shared_ptr<Record>, base::NoCaseHash, base::NoCaseEqual>
         by_code;

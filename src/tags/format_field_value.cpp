@@ -22,9 +22,12 @@ struct Source {
     base::Value Field(std::string_view name) const { return record.GetField(base::Trimmed(name)); }
 };
 
-// "&nbsp;" for nothing, < and > escaped.
+// "&nbsp;" for nothing, < and > escaped. Browsers would drop a NUL or keep it as they like.
 std::string FieldHtml(std::string text) {
     if (text.empty()) return std::string(kNothing);
+    if (text.find('\0') != npos) {
+        text = base::Replaced(text, std::string_view("\0", 1), "\xEF\xBF\xBD");
+    }
     // Two searches by byte are several times faster than one for either.
     if (text.find('<') == npos && text.find('>') == npos) return text;
     return base::Replaced(base::Replaced(text, "<", "&lt;"), ">", "&gt;");

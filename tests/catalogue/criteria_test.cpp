@@ -62,7 +62,7 @@ TEST(Criteria, Favourites) {
         {"no price list: the text itself", 0, "Price > 0", "Price > 0"},
     };
     for (const Case& c : cases) {
-        EXPECT_EQ(FavouritesCriterion(c.price_list, c.favourites), c.criterion) << c.label;
+        EXPECT_EQ(FavouritesCriterion(c.price_list, c.favourites).text(), c.criterion) << c.label;
     }
 }
 
@@ -114,18 +114,19 @@ TEST(Criteria, CategoryList) {
          "GRArticle.GRArticleCatRel.IDGRArticleCat IN (3) and (GRArticle.code like 'x*' or "
          "GRArticle.name like '*x*')"},
     };
-    for (const Case& c : cases) EXPECT_EQ(CategoryCriterion(c.request), c.criterion) << c.label;
+    for (const Case& c : cases)
+        EXPECT_EQ(CategoryCriterion(c.request).text(), c.criterion) << c.label;
 }
 
 TEST(Criteria, PlainSearchFindsLinesWithoutAPrice) {
     ListRequest request = Request(7, "", "x");
     request.SearchCodeColumn = "Barcode";
-    EXPECT_EQ(SearchCriterion(request),
+    EXPECT_EQ(SearchCriterion(request).text(),
               "{GRPriceListRel.ID IN (select P5.ID from SQPriceList5 P5 inner join GRArticle on "
               "P5.IDGRArticle=GRArticle.ID where (GRArticle.name LIKE '*x*' OR GRArticle.Barcode "
               "LIKE 'x*') AND (IDGRPriceList=7))}");
     request.PriceListId = 0;
-    EXPECT_EQ(SearchCriterion(request),
+    EXPECT_EQ(SearchCriterion(request).text(),
               "(GRArticle.Barcode like 'x*' or GRArticle.name like '*x*')");
 }
 

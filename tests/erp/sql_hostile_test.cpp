@@ -108,6 +108,60 @@ TEST(HostileTest, FiltersGiveOwnRowsOrFail) {
     }
 }
 
+data::Filter WithTyped(std::string_view filter, std::string_view typed) {
+    data::Filter whole;
+    for (const std::string_view piece : base::Split(filter, '@')) {
+        whole += (whole.empty() ? "" : data::Filter(data::Typed{typed})) + piece;
+    }
+    return whole;
+}
+
+// The same texts as people type them: in quotes a text that no article holds, elsewhere an error.
+TEST(HostileTest, TypedTextIsAValueAndNothingElse) {
+    const auto outcome_of = [](const Reader& reader, const data::Filter& filter) {
+        return Outcome([&] {
+            return Database().translator().ListKeys(reader, "GRPriceListRel", filter, "", {});
+        });
+    };
+    for (const FilterRow& row : kFilters) {
+        if (*row.filter == '@') continue;
+        SCOPED_TRACE(base::Replaced(row.filter, "@", row.typed));
+        const std::string outcome = outcome_of(FirstCustomer(), WithTyped(row.filter, row.typed));
+        const bool in_quotes = row.filter == kSearch || row.filter == kOwnSearch;
+        const bool number =
+            std::string_view(row.typed).find_first_not_of("0123456789") == std::string_view::npos;
+        EXPECT_EQ(outcome.starts_with("error") ? "error" : outcome,
+                  in_quotes || number ? "" : "error");
+    }
+    const struct {
+        const char* filter;
+        const char* typed;
+        const char* keys;  // a guest's
+    } rows[] = {
+        {kOwnSearch, "It's*", "5"},
+        {kOwnSearch, "It''s*", ""},
+        {kOwnSearch, "*'*", "5"},
+        {kOwnSearch, "X_1", "5"},
+        {"GRArticle.Code in ('@','@')", "X_1", "5"},
+        {"ID in (@)", "4, 5,6", "4;5"},
+        {"ID in (@)", "4)", "error"},
+        {"ID in (@)", "'4'", "error"},
+        {"ID in (@)", "ID", "error"},
+        {"ID in (@)", "-4", "error"},
+        {"ID=1@", "2 or 1=1", "error"},
+        {"ID=1@", "2", "error"},  // no part of what the filter says itself
+        {"GRArticle.N@='x'", "ame", "error"},
+        {"GRArticle.[N@]='x'", "ame", "error"},
+        {"GRArticle.Name like 'x'@", "'", "error"},
+        {"{ID>0 and '@'='@'}", "x' or 'a'='", "4;5"},
+    };
+    for (const auto& row : rows) {
+        const std::string outcome = outcome_of(GuestReader(), WithTyped(row.filter, row.typed));
+        EXPECT_EQ(outcome.starts_with("error") ? "error" : outcome, row.keys)
+            << row.filter << " with " << row.typed;
+    }
+}
+
 struct StatementRow {
     const char* text;
     const char* user;
@@ -135,6 +189,12 @@ const StatementRow kStatements[] = {
     {"select Name from SYUser", "first", ""},
     {"select PasswordHash from SYUser", kNone, kNone},
     {"select ID from SYUser order by PasswordHash", kNone, kNone},
+    {"select ID from GRTax order by case when exists (select 1 from SDOrder) then 1 end",
+     kNone,
+     kNone},
+    {"select ID from GRTax order by (select max(ID) from SDOrder)", kNone, kNone},
+    {"select ID from GRTax order by ID+1", kNone, kNone},
+    {"select * from SDOrderReview", kNone, kNone},
     {"select count(*) from SYUser group by Name having max(PasswordHash) like 's%'", kNone, kNone},
     {"select ID from GRPriceList", "10;20", "11"},
     {"select ID from GRPriceListRel", "1;2;3", "4;5"},

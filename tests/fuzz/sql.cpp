@@ -6,7 +6,7 @@
 #include "tests/fuzz/harness.h"
 
 // The first line says what the others are: "filter TABLE", "order TABLE", "field TABLE", a whole
-// "statement", or a text that is searched for ("search").
+// "statement", or a text that is searched for ("search" with quotes that count, "typed" without).
 //
 // It is run over two databases that are alike in what the customer may see, and in nothing else.
 // Whatever he asks for, both give the same: neither values nor counts, orders or errors tell
@@ -66,6 +66,13 @@ BoundSql Translated(std::string_view kind, std::string_view table, std::string_v
     }
     if (kind == "search") {
         const std::string filter = base::Replaced(kSearch, "@", text);
+        return translator.ListKeys(reader, "GRPriceListRel", filter, "", {});
+    }
+    if (kind == "typed") {
+        data::Filter filter;
+        for (const std::string_view piece : base::Split(kSearch, '@')) {
+            filter += (filter.empty() ? "" : data::Filter(data::Typed{text})) + piece;
+        }
         return translator.ListKeys(reader, "GRPriceListRel", filter, "", {});
     }
     return translator.Select(reader, text);

@@ -26,6 +26,9 @@ class Browser {
     const std::string& Post(std::string_view page, Fields fields) {
         return Follow(Address(page), "POST", Encoded(fields));
     }
+    const std::string& PostBody(std::string_view page, const std::string& body) {
+        return Follow(Address(page), "POST", body);
+    }
     const std::string& GetPath(const std::string& path) { return Follow(path, "GET", {}); }
 
     const std::string& LogOn(const std::string& user, const std::string& password) {

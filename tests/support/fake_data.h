@@ -167,10 +167,10 @@ class Application : public data::DataApplication {
         return ListOf(table, {})->Find("ID=" + std::to_string(id));
     }
     std::shared_ptr<data::RecordList> OpenList(std::string_view table,
-                                               std::string_view filter,
+                                               const data::Filter& filter,
                                                std::string_view order) override {
-        Ask("OpenList", Joined(Joined(table, filter), order));
-        return ListOf(table, filter);
+        Ask("OpenList", Joined(Joined(table, filter.text()), order));
+        return ListOf(table, filter.text());
     }
     std::shared_ptr<data::RecordList> OpenQuery(std::string_view sql, int, int) override {
         Ask("OpenQuery", std::string(sql));
@@ -178,9 +178,9 @@ class Application : public data::DataApplication {
         return found == queries.end() ? any_query : found->second;
     }
     std::shared_ptr<data::Table> OpenTable(std::string_view table,
-                                           std::string_view filter) override {
-        Ask("OpenTable", Joined(table, filter));
-        const auto found = documents.find(Joined(table, filter));
+                                           const data::Filter& filter) override {
+        Ask("OpenTable", Joined(table, filter.text()));
+        const auto found = documents.find(Joined(table, filter.text()));
         return std::make_shared<Table>(found == documents.end() ? documents[std::string(table)]
                                                                 : found->second);
     }

@@ -1,5 +1,8 @@
 #include "erp/sql/lexer.h"
 
+#include <algorithm>
+#include <iterator>
+
 #include "base/text.h"
 #include "erp/sql/errors.h"
 
@@ -29,7 +32,8 @@ bool IsSpace(char c) {
 
 }  // namespace
 
-Lexer::Lexer(std::string_view text, Style style) : text_(text), style_(style) {
+Lexer::Lexer(std::string_view text, Style style, std::span<const Span> typed)
+    : text_(text), style_(style), typed_(typed) {
     if (text.size() > kLongestText) {
         Fail("The condition or statement is too long");
     }
@@ -69,6 +73,30 @@ void Lexer::Advance() {
     } else {
         token_ = Symbol();
     }
+    if (!typed_.empty()) {
+        RefuseTypedSyntax();
+    }
+}
+
+void Lexer::RefuseTypedSyntax() const {
+    const bool began_typed = IsTyped(start_);
+    if (token_.IsSymbol(",") || (token_.kind == TokenKind::kText && !began_typed)) {
+        return;
+    }
+    for (std::size_t at = start_; at < next_; ++at) {
+        const bool is_number = token_.kind == TokenKind::kInteger && began_typed;
+        if (IsTyped(at) && !is_number) {
+            Fail("Only whole numbers may be typed here", Rest());
+        }
+    }
+}
+
+bool Lexer::IsTyped(std::size_t position) const {
+    const auto behind = std::upper_bound(
+        typed_.begin(), typed_.end(), position, [](std::size_t at, const Span& span) {
+            return at < span.begin;
+        });
+    return behind != typed_.begin() && position < std::prev(behind)->end;
 }
 
 std::string_view Lexer::Quoted(char end) {
@@ -90,10 +118,13 @@ Token Lexer::Text(std::size_t quote) {
         if (at == std::string_view::npos) {
             Fail("A text in quotes does not end", Rest());
         }
-        if (At(at + 1) != '\'') {
+        if (IsTyped(at)) {
+            ++at;
+        } else if (At(at + 1) == '\'' && !IsTyped(at + 1)) {
+            at += 2;
+        } else {
             break;
         }
-        at += 2;
     }
     const std::string_view inside = text_.substr(quote + 1, at - quote - 1);
     if (inside.find('\0') != std::string_view::npos) {
@@ -173,8 +204,14 @@ Token Lexer::Symbol() {
     return {TokenKind::kSymbol, pair.substr(0, 1)};
 }
 
-std::string TextOf(const Token& token) {
-    return base::Replaced(token.text, "''", "'");
+std::string Lexer::TextOf(const Token& token) const {
+    std::string text;
+    const auto begin = static_cast<std::size_t>(token.text.data() - text_.data());
+    for (std::size_t at = begin; at < begin + token.text.size(); ++at) {
+        text += text_[at];
+        at += text_[at] == '\'' && !IsTyped(at) ? 1 : 0;
+    }
+    return text;
 }
 
 }  // namespace zebtell::erp::sql

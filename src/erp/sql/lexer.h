@@ -1,9 +1,11 @@
 #pragma once
 
 #include <cstdint>
+#include <span>
 #include <string>
 #include <string_view>
 
+#include "data/filter.h"
 #include "erp/sql/keywords.h"
 
 namespace zebtell::erp::sql {
@@ -40,18 +42,26 @@ struct Token {
 };
 
 // Splits a text into tokens. Comments, semicolons, variables and control characters are errors.
-// A copy is a place to come back to.
+// What people typed is never more than a value: a quote in it does not end the text around it, and
+// outside of quotes only whole numbers and commas may come of it. A copy is a place to come back
+// to.
 class Lexer {
   public:
-    Lexer(std::string_view text, Style style);
+    using Span = data::Filter::Span;
+
+    Lexer(std::string_view text, Style style, std::span<const Span> typed = {});
 
     const Token& Peek() const { return token_; }
     Token Take();
     // What is left, from the next token on.
     std::string_view Rest() const { return text_.substr(start_); }
+    // The text that a token in quotes stands for: doubled quotes are one, unless they were typed.
+    std::string TextOf(const Token& token) const;
 
   private:
     void Advance();
+    void RefuseTypedSyntax() const;
+    bool IsTyped(std::size_t position) const;
     std::string_view Quoted(char end);
     Token Text(std::size_t quote);
     Token Number();
@@ -62,12 +72,10 @@ class Lexer {
 
     std::string_view text_;
     Style style_;
+    std::span<const Span> typed_;
     std::size_t start_ = 0;  // of token_
     std::size_t next_ = 0;
     Token token_;
 };
-
-// The text that a token stands for: doubled quotes are one.
-std::string TextOf(const Token& token);
 
 }  // namespace zebtell::erp::sql

@@ -3,6 +3,15 @@
 #include "erp/sql/parser.h"
 
 namespace zebtell::erp::sql {
+namespace {
+
+// Links of a page may say the order of a statement: they choose columns, and compute nothing.
+bool IsColumn(const Expr& expression) {
+    return std::holds_alternative<Path>(expression.node) ||
+           std::holds_alternative<Literal>(expression.node);
+}
+
+}  // namespace
 
 SelectPtr Parser::ParseSelect() {
     const Deeper deeper(*this);
@@ -158,6 +167,9 @@ std::vector<OrderItem> Parser::ParseOrder() {
     std::vector<OrderItem> order;
     do {
         OrderItem item{ParseOr()};
+        if (!IsColumn(*item.expression)) {
+            Fail("An order is columns or paths, separated by commas");
+        }
         item.descending = AcceptKeyword(Keyword::kDesc);
         if (!item.descending) {
             AcceptKeyword(Keyword::kAsc);

@@ -104,7 +104,7 @@ ExprPtr Parser::ParseLiteral() {
     const Token token = lexer_.Take();
     switch (token.kind) {
         case TokenKind::kText:
-            return Make(Literal{TextOf(token)});
+            return Make(Literal{lexer_.TextOf(token)});
         case TokenKind::kDate:
             return Make(Literal{DateOf(token.text)});
         default:

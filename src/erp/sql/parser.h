@@ -17,7 +17,7 @@ namespace zebtell::erp::sql {
 //   item       = "*" | alias ".*" | or [[AS] alias]
 //   table      = (name | "(" select ")") [[AS] alias] [WITH "(" NOLOCK ")"]
 //   join       = "," table | CROSS JOIN table | [INNER | LEFT [OUTER]] JOIN table ON or
-//   order      = or [ASC | DESC] {"," or [ASC | DESC]}
+//   order      = column [ASC | DESC] {"," column [ASC | DESC]}; a path, or a position
 //   or         = and {OR and}
 //   and        = not {AND not}
 //   not        = NOT not | predicate
@@ -30,7 +30,8 @@ namespace zebtell::erp::sql {
 //                | EXISTS "(" select ")" | "(" select ")" | "(" or ")"
 class Parser {
   public:
-    Parser(std::string_view text, Style style) : lexer_(text, style) {}
+    Parser(std::string_view text, Style style, std::span<const data::Filter::Span> typed = {})
+        : lexer_(text, style, typed) {}
 
     // Each reads the whole text.
     ExprPtr ParseCondition();

@@ -33,9 +33,12 @@ constexpr DeclaredType kDeclaredTypes[] = {
     {"datetime", ColumnType::kDateTime},
 };
 
-std::string_view TextOf(sqlite3_stmt* statement, int column) {
-    const auto* text = reinterpret_cast<const char*>(sqlite3_column_text(statement, column));
-    return {text ? text : "", static_cast<std::size_t>(sqlite3_column_bytes(statement, column))};
+// SQLite keeps whatever bytes an ERP has put into it; pages are sent as UTF-8.
+std::string TextOf(sqlite3_stmt* statement, int column) {
+    const auto* bytes = reinterpret_cast<const char*>(sqlite3_column_text(statement, column));
+    std::string text(bytes ? bytes : "",
+                     static_cast<std::size_t>(sqlite3_column_bytes(statement, column)));
+    return base::Utf8FromEither(std::move(text));
 }
 
 // Amounts are stored as binary numbers; the nearest ten-thousandth is the one that was meant.
@@ -52,7 +55,7 @@ base::Currency CurrencyOf(double stored) {
 }
 
 base::Value ReadDateTime(sqlite3_stmt* statement, int column) {
-    const std::string_view text = TextOf(statement, column);
+    std::string text = TextOf(statement, column);
     if (const auto time = base::DateTime::FromIso(text)) {
         return *time;
     }
