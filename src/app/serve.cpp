@@ -25,7 +25,7 @@ sigset_t AwaitedSignals(bool has_certificate) {
 void ReloadCertificate(Portal& portal) {
     try {
         portal.ReloadCertificate();
-        std::cout << "ZEBTell has read its certificate anew" << std::endl;
+        std::cout << "ZEBTell uses the certificate as it is now" << std::endl;
     } catch (const base::RuntimeError& error) {
         std::cerr << "zebtell: the certificate stays the old one: " << error.description()
                   << std::endl;
@@ -33,10 +33,10 @@ void ReloadCertificate(Portal& portal) {
 }
 
 // Until the program is told to stop.
-void AwaitStop(const sigset_t& signals, Portal& portal) {
+void AwaitStop(const sigset_t& signals, Portal& portal, bool has_certificate) {
     for (int signal = 0; sigwait(&signals, &signal) == 0;) {
         if (signal != SIGHUP) return;
-        ReloadCertificate(portal);
+        if (has_certificate) ReloadCertificate(portal);
     }
 }
 
@@ -60,17 +60,18 @@ int Serve(const std::filesystem::path& folder,
     override(settings);
 
     // Blocked before any thread is there, so that only the wait below gets them.
-    const sigset_t signals = AwaitedSignals(!settings.TlsKey.empty());
+    const bool has_certificate = !settings.TlsKey.empty();
+    const sigset_t signals = AwaitedSignals(has_certificate);
     pthread_sigmask(SIG_BLOCK, &signals, nullptr);
     // A file that may not grow any more is an error of that write, not the end of the portal.
     std::signal(SIGXFSZ, SIG_IGN);
 
     if (IsRoot()) std::cerr << "zebtell: runs as root, and needs no such rights" << std::endl;
     Portal portal(here, settings);
-    std::cout << "ZEBTell serves " << (settings.TlsKey.empty() ? "http" : "https") << "://"
+    std::cout << "ZEBTell serves " << (has_certificate ? "https" : "http") << "://"
               << settings.Address << ":" << portal.port() << settings.BasePath << std::endl;
     WarnOfDatabase(here);
-    AwaitStop(signals, portal);
+    AwaitStop(signals, portal, has_certificate);
     std::cout << "ZEBTell stops" << std::endl;
     return 0;
 }
