@@ -185,7 +185,7 @@ bool Added(TagCall& c) {
 }
 
 bool AddedCount(TagCall& c) {
-    tags::WriteByPicture(c, int{c.state.basket_form.LastForm.AddedRows});
+    tags::WriteByPicture(c, c.state.basket_form.LastForm.AddedRows);
     return true;
 }
 

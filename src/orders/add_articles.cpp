@@ -41,14 +41,14 @@ void AddTo(data::BasketValues& basket, RowsByArticle& rows, const WantedArticle&
 }
 
 // The number of those that were added.
-std::int16_t AddAll(SessionState& state,
-                    const std::vector<WantedArticle>& all,
-                    bool one_row_an_article,
-                    Refusals& refusals) {
+int AddAll(SessionState& state,
+           const std::vector<WantedArticle>& all,
+           bool one_row_an_article,
+           Refusals& refusals) {
     if (all.empty()) return 0;
     EnsureBasket(state);
     RowsByArticle rows = ReadRows(state.basket);
-    std::int16_t added = 0;
+    int added = 0;
     for (const WantedArticle& wanted : all) {
         const auto add = [&] {
             if (!one_row_an_article) rows.clear();

@@ -16,6 +16,9 @@ using base::Currency;
 using data::Record;
 using host::SessionState;
 
+// Lines of the quick entry that are taken at once; the others come back in it.
+constexpr std::size_t kMostLines = 500;
+
 // What `text` says of each item, separated by commas.
 template <class Items, class Text>
 std::string Joined(const Items& items, Text&& text) {
@@ -78,7 +81,7 @@ void AddCodeWish(std::vector<Wish>& wishes, std::string code, std::string quanti
     wish.wanted.box = kQuickEntryBox;
 }
 
-std::vector<Wish> CodeWishes(const web::Request& request) {
+std::vector<Wish> CodeWishes(const web::Request& request, Refusals& refusals) {
     std::vector<Wish> wishes;
     for (std::int16_t n = 1; n < std::numeric_limits<std::int16_t>::max(); ++n) {
         if (!request.Form.Has("Code_f" + std::to_string(n))) break;
@@ -86,8 +89,13 @@ std::vector<Wish> CodeWishes(const web::Request& request) {
                     tags::ReadRowField(request, "Code", n),
                     tags::ReadRowField(request, "Quantity", n));
     }
+    std::size_t taken = 0;
     for (QuickEntryLine& line : ReadQuickEntry(request.Form[kQuickEntryBox])) {
-        AddCodeWish(wishes, std::move(line.code), std::move(line.quantity));
+        if (taken++ < kMostLines) {
+            AddCodeWish(wishes, std::move(line.code), std::move(line.quantity));
+        } else {
+            refusals.Add(line.code, line.quantity, kQuickEntryBox);
+        }
     }
     return wishes;
 }
@@ -154,7 +162,7 @@ std::vector<WantedArticle> ReadWantedArticles(SessionState& state,
                                               const web::Request& request,
                                               Refusals& refusals) {
     std::vector<Wish> rows = RowWishes(request);
-    std::vector<Wish> codes = CodeWishes(request);
+    std::vector<Wish> codes = CodeWishes(request, refusals);
     FindRows(state, rows);
     FindCodes(state, codes);
     std::vector<WantedArticle> wanted;

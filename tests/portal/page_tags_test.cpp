@@ -57,6 +57,11 @@ TEST_F(PageTags, WhatBecameOfAFormIsSaidOnceAndBesideItsFields) {
                {"QuickEntry", "4740000000011\t5\nOR-1\tx\nSA-1\t3\n"}});
     EXPECT_EQ(mari.page(), "[added 2](ID_1101: &lt;b&gt;)[lines POLE\t1\nOR-1\tx\nSA-1\t3\n][end]");
     EXPECT_EQ(mari.Get("Kaubainfo"), "[end]");
+    std::string many;
+    for (int n = 1; n <= 501; ++n) many += "OR-1\t1\n";
+    mari.Post("Kaubainfo&event=Lisamine", {{"ID_unique", "1"}, {"QuickEntry", many}});
+    EXPECT_EQ(mari.page(), "[added 500][lines OR-1\t1\n][end]") << "too many at once";
+    mari.Get("Koostamine&event=DEL_3&Next=Kaubainfo");
     mari.Post("Kaubainfo&event=Tellimus",
               {{"Change_Quant", "1"}, {"Row_1", "3"}, {"Row_2", "palju"}});
     EXPECT_EQ(mari.page(), "(Row_2: palju)[end]");

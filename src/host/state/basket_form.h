@@ -13,7 +13,7 @@ namespace zebtell::host {
 
 // What became of the last form with quantities, for the one page that is shown next.
 struct FormOutcome {
-    std::int16_t AddedRows = 0;
+    int AddedRows = 0;
     // What was typed but refused, by the fields' names.
     std::unordered_map<std::string, std::string, base::NoCaseHash, base::NoCaseEqual> Refused;
 };
