@@ -76,7 +76,8 @@ function(zebtell_fuzz name)
     add_executable(fuzz_${name} ${name}.cpp harness.cpp ${ARG_USES})
     target_include_directories(fuzz_${name} PRIVATE ${PROJECT_SOURCE_DIR})
     target_compile_definitions(fuzz_${name}
-                               PRIVATE ZEBTELL_SOURCE_FOLDER="${PROJECT_SOURCE_DIR}")
+                               PRIVATE ZEBTELL_SOURCE_FOLDER="${PROJECT_SOURCE_DIR}"
+                                       ZEBTELL_DEFAULT_TEMPLATES="${ZEBTELL_TEMPLATES}")
     target_link_libraries(fuzz_${name} PRIVATE ${ARG_LINK})
     target_link_options(fuzz_${name} PRIVATE -fsanitize=fuzzer)
     add_dependencies(fuzz fuzz_${name})
