@@ -45,7 +45,7 @@ class HarmlessText : public PortalTest {
                          "\r\nLanguage=" + language + "\r\n[WEBLog]\r\nLevel=None\r\n");
     }
 
-    // The text, and the record's key behind it, for every text that is not what the portal works
+    // The record's key and the text behind it, for every text that is not what the portal works
     // by.
     void Plant(const std::string& text) {
         const std::string columns = company().Run(
@@ -59,7 +59,7 @@ class HarmlessText : public PortalTest {
             if (kKept.contains(std::string(column)) || column.empty()) continue;
             const std::size_t dot = column.find('.');
             script.append("UPDATE ").append(column.substr(0, dot)).append(" SET ");
-            script.append(column.substr(dot + 1)).append(" = CAST(X'" + hex + "' AS TEXT) || ID;");
+            script.append(column.substr(dot + 1)).append(" = ID || CAST(X'" + hex + "' AS TEXT);");
         }
         company().Run(script);
     }
