@@ -2,6 +2,8 @@
 
 #include <sqlite3.h>
 
+#include <clocale>
+
 #include "erp/sqlite/backend.h"
 #include "erp/sqlite/functions.h"
 
@@ -41,6 +43,8 @@ class SqliteFileBackend : public odbc::OdbcBackend {
 }  // namespace
 
 OdbcSqlite::OdbcSqlite(const std::filesystem::path& file) : file_(file) {
+    // The driver takes statements in the locale's encoding.
+    std::setlocale(LC_CTYPE, "C.UTF-8");
     sqlite3_auto_extension(kRegister);
 }
 
