@@ -4,6 +4,7 @@
 #include <sql.h>
 #include <sqlext.h>
 
+#include <cstddef>
 #include <string>
 #include <string_view>
 
@@ -13,6 +14,11 @@ static_assert(sizeof(SQLWCHAR) == sizeof(char16_t));
 
 inline SQLWCHAR* Wide(std::u16string& text) {
     return reinterpret_cast<SQLWCHAR*>(text.data());
+}
+
+// Attributes that are numbers are handed over as pointers, too.
+inline SQLPOINTER AttributeValue(std::size_t number) {
+    return reinterpret_cast<SQLPOINTER>(number);  // NOLINT(performance-no-int-to-ptr)
 }
 
 // An ODBC handle, freed with the object.

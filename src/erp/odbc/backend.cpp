@@ -17,10 +17,7 @@ class ClockWatch : public CommitWatch {
 
 std::shared_ptr<Environment> MakeEnvironment() {
     auto environment = std::make_shared<Environment>(SQLHANDLE{});
-    SQLSetEnvAttr(environment->get(),
-                  SQL_ATTR_ODBC_VERSION,
-                  reinterpret_cast<SQLPOINTER>(std::size_t{SQL_OV_ODBC3}),
-                  0);
+    SQLSetEnvAttr(environment->get(), SQL_ATTR_ODBC_VERSION, AttributeValue(SQL_OV_ODBC3), 0);
     return environment;
 }
 

@@ -46,7 +46,7 @@ ConnectionHandle::ConnectionHandle(const Environment& environment,
     : handle_(environment.get()) {
     SQLSetConnectAttrW(handle_.get(),
                        SQL_ATTR_LOGIN_TIMEOUT,
-                       reinterpret_cast<SQLPOINTER>(static_cast<std::size_t>(limit.count())),
+                       AttributeValue(static_cast<std::size_t>(limit.count())),
                        0);
     std::u16string wide = ToUtf16(connection_string);
     SQLSMALLINT length = 0;

@@ -13,9 +13,7 @@ constexpr std::size_t kBlockBytes = std::size_t{32} * 1024;
 constexpr std::size_t kMostRows = 1000;
 
 void SetAttribute(Link& link, SQLHSTMT statement, SQLINTEGER attribute, std::size_t value) {
-    Check(link,
-          statement,
-          SQLSetStmtAttrW(statement, attribute, reinterpret_cast<SQLPOINTER>(value), 0));
+    Check(link, statement, SQLSetStmtAttrW(statement, attribute, AttributeValue(value), 0));
 }
 
 class BlockRows : public Rows {

@@ -18,8 +18,7 @@ Statement::Statement(Link& link) : link_(link), handle_(link.handle) {
     }
     // Drivers that have no time limit of their own say so; the portal works without it.
     const auto seconds = static_cast<std::size_t>(link.limits.statement.count());
-    SQLSetStmtAttrW(
-        handle_.get(), SQL_ATTR_QUERY_TIMEOUT, reinterpret_cast<SQLPOINTER>(seconds), 0);
+    SQLSetStmtAttrW(handle_.get(), SQL_ATTR_QUERY_TIMEOUT, AttributeValue(seconds), 0);
 }
 
 Statement::Statement(Link& link, const std::string& text) : Statement(link) {
