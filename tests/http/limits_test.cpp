@@ -1,5 +1,5 @@
+#include <gtest/gtest.h>
 
-#include <algorithm>
 #include <algorithm>
 #include <optional>
 
