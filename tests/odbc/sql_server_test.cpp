@@ -2,6 +2,7 @@
 
 #include <chrono>
 #include <mutex>
+#include <utility>
 #include <vector>
 
 #include "base/runtime_error.h"
@@ -52,6 +53,10 @@ class SqlServerTest : public testing::Test {
         }
         return {};
     }
+    void Script(std::vector<Rule> rules) {
+        const std::lock_guard lock(mutex_);
+        rules_ = std::move(rules);
+    }
     std::string Requests() {
         const std::lock_guard lock(mutex_);
         return requests_;
@@ -88,7 +93,7 @@ TEST_F(SqlServerTest, ValuesAreBoundAsWhatTheyAre) {
 }
 
 TEST_F(SqlServerTest, SettingsAndTransactionsAreBatchesOfTheirOwn) {
-    rules_ = {{"SCOPE_IDENTITY", {.kind = Kind::kInteger, .number = 4711}}};
+    Script({{"SCOPE_IDENTITY", {.kind = Kind::kInteger, .number = 4711}}});
     const auto connection = backend_.Connect(Access::kWrite);
     connection->Begin();
     EXPECT_EQ(connection->Insert({"INSERT INTO T (a) VALUES (?)", {1}}), 4711);
@@ -156,7 +161,7 @@ TEST_F(SqlServerTest, ErrorsOfTheServerHaveTheirMeanings) {
          false},
     };
     for (const auto& row : rows) {
-        rules_ = {{"SELECT a", {.kind = Kind::kError, .number = row.number, .text = row.words}}};
+        Script({{"SELECT a", {.kind = Kind::kError, .number = row.number, .text = row.words}}});
         const auto connection = backend_.Connect(Access::kRead);
         try {
             connection->Query({"SELECT a FROM T WHERE b = ?", {1}});
@@ -167,20 +172,20 @@ TEST_F(SqlServerTest, ErrorsOfTheServerHaveTheirMeanings) {
         }
         EXPECT_EQ(connection->IsBroken(), row.broken) << row.number;
         // The connection is of use again.
-        rules_.clear();
+        Script({});
         connection->Execute({"SELECT a FROM T WHERE b = ?", {1}});
     }
 }
 
 TEST_F(SqlServerTest, ALogOnThatIsRefusedIsNotAServerThatIsAway) {
     for (const int number : {18456, 18470, 18488}) {
-        rules_ = {{"", {.kind = Kind::kError, .number = number, .text = "Login failed."}}};
+        Script({{"", {.kind = Kind::kError, .number = number, .text = "Login failed."}}});
         EXPECT_THROW(backend_.Connect(Access::kRead), LoginRefused) << number;
     }
-    rules_ = {{"", {.kind = Kind::kError, .number = 4060, .text = "Cannot open database."}}};
+    Script({{"", {.kind = Kind::kError, .number = 4060, .text = "Cannot open database."}}});
     EXPECT_EQ(DescriptionOf([&] { backend_.Connect(Access::kRead); }),
               "The company database is not there");
-    rules_ = {{"", {.kind = Kind::kHangUp}}};
+    Script({{"", {.kind = Kind::kHangUp}}});
     EXPECT_EQ(DescriptionOf([&] { backend_.Connect(Access::kRead); }),
               "The database server does not answer");
 }
@@ -188,7 +193,7 @@ TEST_F(SqlServerTest, ALogOnThatIsRefusedIsNotAServerThatIsAway) {
 TEST_F(SqlServerTest, ConnectingEndsInTime) {
     const auto start = steady_clock::now();
     for (const Kind kind : {Kind::kSilence, Kind::kGarbage}) {
-        rules_ = {{"", {.kind = kind}}};
+        Script({{"", {.kind = kind}}});
         EXPECT_EQ(DescriptionOf([&] { backend_.Connect(Access::kRead); }),
                   "The database server does not answer");
     }
@@ -200,7 +205,7 @@ TEST_F(SqlServerTest, ConnectingEndsInTime) {
 }
 
 TEST_F(SqlServerTest, AStatementWithoutAnswerBreaksItsConnection) {
-    rules_ = {{"SELECT slow", {.kind = Kind::kSilence}}};
+    Script({{"SELECT slow", {.kind = Kind::kSilence}}});
     const auto connection = backend_.Connect(Access::kRead);
     const auto start = steady_clock::now();
     EXPECT_EQ(DescriptionOf([&] {
@@ -213,8 +218,8 @@ TEST_F(SqlServerTest, AStatementWithoutAnswerBreaksItsConnection) {
 
 // Only the first connection is lost, so the second try succeeds.
 TEST_F(SqlServerTest, ALostReadIsTriedAgainOnANewConnection) {
-    rules_ = {{"SELECT a", {.kind = Kind::kHangUp}, 1},
-              {"SELECT a", {.kind = Kind::kInteger, .number = 7}}};
+    Script({{"SELECT a", {.kind = Kind::kHangUp}, 1},
+            {"SELECT a", {.kind = Kind::kInteger, .number = 7}}});
     ConnectionPool pool(backend_);
     const auto read = [](Connection& connection) {
         const auto cursor = connection.Query({"SELECT a FROM T WHERE b = ?", {1}});
@@ -224,7 +229,7 @@ TEST_F(SqlServerTest, ALostReadIsTriedAgainOnANewConnection) {
     EXPECT_EQ(server_.connections(), 2);
     EXPECT_EQ(pool.Reading(read), 7);
     EXPECT_EQ(server_.connections(), 2);
-    rules_ = {{"SELECT a", {.kind = Kind::kHangUp}}};
+    Script({{"SELECT a", {.kind = Kind::kHangUp}}});
     EXPECT_THROW(pool.Reading(read), TransientError);
     EXPECT_EQ(server_.connections(), 3);
 }
@@ -237,7 +242,7 @@ TEST_F(SqlServerTest, ADeadlockVictimIsRunOnceMore) {
         connection.Execute({"UPDATE T SET a = ?", {1}});
         return ++runs;
     };
-    rules_ = {{"UPDATE T", deadlock, 1}};
+    Script({{"UPDATE T", deadlock, 1}});
     EXPECT_EQ(InTransaction(pool, store), 1);
     // As a whole: rolled back, begun anew, committed.
     const std::string requests = Requests();
@@ -245,18 +250,18 @@ TEST_F(SqlServerTest, ADeadlockVictimIsRunOnceMore) {
     ASSERT_NE(end, std::string::npos);
     EXPECT_THAT(requests.substr(end), HasSubstr("\nBEGIN TRANSACTION\n"));
     EXPECT_THAT(requests.substr(end), testing::EndsWith("\nCOMMIT TRANSACTION\n"));
-    rules_ = {{"UPDATE T", deadlock, 2}};
+    Script({{"UPDATE T", deadlock, 2}});
     EXPECT_EQ(DescriptionOf([&] { InTransaction(pool, store); }), "The database is busy");
 }
 
 // Nobody knows what has become of it, so it is not run again.
 TEST_F(SqlServerTest, ALostCommitIsNotRepeated) {
-    rules_ = {{"COMMIT", {.kind = Kind::kHangUp}}};
+    Script({{"COMMIT", {.kind = Kind::kHangUp}}});
     ConnectionPool pool(backend_);
     int runs = 0;
     EXPECT_THROW(InTransaction(pool, [&](Connection&) { return ++runs; }), TransientError);
     EXPECT_EQ(runs, 1);
-    rules_.clear();
+    Script({});
     EXPECT_EQ(InTransaction(pool, [&](Connection&) { return ++runs; }), 2);
     EXPECT_EQ(server_.connections(), 2);
 }
@@ -264,7 +269,7 @@ TEST_F(SqlServerTest, ALostCommitIsNotRepeated) {
 TEST_F(SqlServerTest, AnIdleConnectionIsAskedBeforeItIsLent) {
     ConnectionPool pool(backend_, {.trusted = std::chrono::milliseconds(0)});
     { const Lease first = pool.Write(); }
-    rules_ = {{"SELECT 1", {.kind = Kind::kHangUp}, 1}};
+    Script({{"SELECT 1", {.kind = Kind::kHangUp}, 1}});
     pool.Write()->Execute({"UPDATE T SET a = ?", {1}});
     EXPECT_EQ(server_.connections(), 2);
     { const Lease again = pool.Write(); }
