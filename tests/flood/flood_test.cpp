@@ -138,18 +138,23 @@ TEST_F(Flood, LogOnsHoldNobodyUpWhoIsLoggedOn) {
     Browser customer(portal->port());
     customer.LogOn("klient20", "klient-demo");
     std::atomic<bool> is_over = false;
-    std::atomic<int> refused = 0, turned_away = 0;
+    std::atomic<int> refused = 0, turned_away = 0, impatient = 0;
     std::vector<std::jthread> guessers;
     for (int i = 0; i < 40; ++i) {
         guessers.emplace_back([&, i] {
             for (int round = 0; !is_over; ++round) {
                 Browser guesser(portal->port());
                 const std::string name = "guess" + std::to_string(100 * round + i);
-                const auto answer = guesser.Ask("/?page=Logon&event=Logon",
-                                                "POST",
-                                                Browser::Encoded({{"ZEB_IN_KASUTAJATUNNUS", name},
-                                                                  {"ZEB_IN_PAROOL", "wrong"}}));
-                ++(answer.status == 503 ? turned_away : refused);
+                try {
+                    const auto answer =
+                        guesser.Ask("/?page=Logon&event=Logon",
+                                    "POST",
+                                    Browser::Encoded({{"ZEB_IN_KASUTAJATUNNUS", name},
+                                                      {"ZEB_IN_PAROOL", "wrong"}}));
+                    ++(answer.status == 503 ? turned_away : refused);
+                } catch (const std::runtime_error&) {
+                    ++impatient;  // where log-ons take longer than a client waits
+                }
             }
         });
     }
@@ -164,7 +169,8 @@ TEST_F(Flood, LogOnsHoldNobodyUpWhoIsLoggedOn) {
     EXPECT_GT(refused, 20) << "there was no flood";
     EXPECT_LE(Percentile95(times), kPatience);
     std::cout << "catalogue, 95 of 100: " << Percentile95(times).count() << " ms beside " << refused
-              << " log-ons and " << turned_away << " turned away\n";
+              << " log-ons, " << turned_away << " turned away, " << impatient
+              << " tired of waiting\n";
 }
 
 TEST_F(Flood, StrangersCostLittleAndPushNobodyOut) {

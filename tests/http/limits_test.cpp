@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <optional>
+#include <thread>
 
 #include "tests/http/test_server.h"
 
@@ -190,6 +191,7 @@ TEST(Limits, AddUpLargeBodiesOfAllConnections) {
     EXPECT_EQ(small.Read().status, 200);
     respond({});
     EXPECT_EQ(first.Read().status, 200);
+    std::this_thread::sleep_for(kShort);  // the room is given back behind the answer
     silent.Send(large.substr(100));
     held.Take()({});
     EXPECT_EQ(silent.Read().status, 200) << "there is room again";
