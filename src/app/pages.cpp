@@ -48,7 +48,7 @@ std::vector<host::Page> PortalPages() {
         {"Kaubainfo", "zebtell_kaubad.htm", Kaubainfo_Respond, Kaubainfo_ProcessTag, Kaubainfo_UserEvent,
          {{"Favorites", Kaubainfo_Favorites, Work::kMayWait, Effect::kShows},
           {"Hinnakiri", Kaubainfo_Hinnakiri, Work::kMayWait, Effect::kShows},
-          {"Lisamine", Kaubainfo_Lisamine},
+          {"Lisamine", Kaubainfo_Lisamine, Work::kMayWait},
           {"MuudaRead", Kaubainfo_MuudaRead},
           {"Navigate", Kaubainfo_Navigate, Work::kQuick, Effect::kShows},
           {"Otsing", Kaubainfo_Otsing, Work::kMayWait, Effect::kShows},
